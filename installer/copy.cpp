@@ -1,0 +1,22 @@
+// CopyFileOrFolder: one item, a file or a whole folder tree, into a folder, under its own name.
+#include "shell/window1.h"
+
+// The folder is created first and filled afterwards; nothing is checked and nothing caught,
+// so an exception at any depth leaves the items copied so far in place.
+void Window1::CopyFileOrFolder(Ref<FolderItem> source, Ref<FolderItem> destination) {
+    StackCheck stackCheck;
+    if (!source->Directory()) {
+        source->CopyFileTo(destination);
+        return;
+    }
+    Ref<FolderItem> newFolder = destination->Child(source->Name());
+    newFolder->CreateAsFolder();
+    for (long long index = 1; index <= source->Count(); ++index) {
+        if (source->Item(index)->Directory()) {
+            CopyFileOrFolder(source->Item(index), newFolder);
+        } else {
+            source->Item(index)->CopyFileTo(newFolder);
+        }
+        RuntimeBackgroundTask();
+    }
+}

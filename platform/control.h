@@ -1,0 +1,69 @@
+// Control: what every control of a window has: name and index, window coordinates, page,
+// font and the widget that shows it.
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "platform/property_block.h"
+#include "platform/ref.h"
+
+class QWidget;
+class Window;
+
+class Control : public PropertyObject, public std::enable_shared_from_this<Control> {
+  public:
+    static constexpr long long kNoIndex = -2147483648LL;
+
+    Control() = default;
+    ~Control() override;
+
+    void SetProperty(const std::string& name, const PropertyValue& value) override;
+    void PropertiesApplied() override;
+
+    const std::string& Name() const { return name_; }
+    long long Index() const { return index_; }
+    void SetIndex(long long index) { index_ = index; }
+    int Left() const { return left_; }
+    int Top() const { return top_; }
+    int Width() const { return width_; }
+    int Height() const { return height_; }
+    long long TabPanelIndex() const { return tabPanelIndex_; }
+    Ref<::Window> Window() const;
+
+    // Whether the control can be seen: visible itself, on the page its container shows.
+    bool IsShown() const;
+    // Containers whose pages hide and show the controls that lie on them.
+    virtual bool IsPageContainer() const { return false; }
+    virtual bool ShowsPage(long long /*tabPanelIndex*/) const { return true; }
+
+    // Raised once when the window has built all its controls.
+    virtual void RaiseOpen() {}
+
+    // Platform use: the widget, and the window's hand-over when the control is entered.
+    QWidget* Widget() const { return widget_; }
+    void AttachTo(const std::shared_ptr<::Window>& window);
+    virtual void DetachWidget() { widget_ = nullptr; }
+
+  protected:
+    // Takes ownership of the widget until the window adopts it.
+    void SetWidget(QWidget* widget);
+    // The widget, or NilObjectException once the window that showed it is gone.
+    QWidget& LiveWidget() const;
+    void ApplyFont();
+    void Place();
+
+  private:
+    std::string name_;
+    long long index_ = kNoIndex;
+    int left_ = 0, top_ = 0, width_ = 0, height_ = 0;
+    long long tabPanelIndex_ = 0;
+    bool visible_ = true;
+    std::string initialParent_;
+    std::weak_ptr<::Window> window_;
+    QWidget* widget_ = nullptr;
+    bool widgetAdopted_ = false;
+
+    friend class Window;
+    Ref<Control> Parent() const;
+};

@@ -1,0 +1,126 @@
+// The database classes over the SQLite C library.
+#include "platform/database.h"
+
+#include <sqlite3.h>
+
+#include "platform/text.h"
+
+namespace {
+
+bool IsBlankTail(sqlite3* db, const char* tail) {
+    // Only blanks and comments may follow: a second statement makes the text fail.
+    while (tail && *tail) {
+        sqlite3_stmt* next = nullptr;
+        const char* rest = nullptr;
+        if (sqlite3_prepare_v2(db, tail, -1, &next, &rest) != SQLITE_OK) {
+            return false;
+        }
+        if (next) {
+            sqlite3_finalize(next);
+            return false;
+        }
+        if (rest == tail) {
+            return true;
+        }
+        tail = rest;
+    }
+    return true;
+}
+
+}  // namespace
+
+RecordSet::RecordSet(std::shared_ptr<sqlite3> connection, sqlite3_stmt* statement, bool atEnd)
+    : connection_(std::move(connection)), statement_(statement), atEnd_(atEnd) {
+    const int count = sqlite3_column_count(statement_);
+    for (int i = 0; i < count; ++i) {
+        const char* name = sqlite3_column_name(statement_, i);
+        columns_.emplace_back(name ? name : "");
+    }
+}
+
+RecordSet::~RecordSet() {
+    Close();
+}
+
+Ref<DatabaseField> RecordSet::Field(const std::string& name) const {
+    if (!statement_ || atEnd_) {
+        return nullptr;
+    }
+    for (size_t i = 0; i < columns_.size(); ++i) {
+        if (TextEquals(columns_[i], name)) {
+            const auto column = static_cast<int>(i);
+            const auto* text =
+                reinterpret_cast<const char*>(sqlite3_column_text(statement_, column));
+            const int bytes = sqlite3_column_bytes(statement_, column);
+            return New<DatabaseField>(text ? std::string(text, static_cast<size_t>(bytes))
+                                           : std::string());
+        }
+    }
+    return nullptr;
+}
+
+// A failure while stepping ends the rows, as the end of the result would.
+void RecordSet::MoveNext() {
+    if (statement_ && !atEnd_) {
+        atEnd_ = sqlite3_step(statement_) != SQLITE_ROW;
+    }
+}
+
+void RecordSet::Close() {
+    if (statement_) {
+        sqlite3_finalize(statement_);
+        statement_ = nullptr;
+    }
+    atEnd_ = true;
+    connection_.reset();
+}
+
+bool SQLiteDatabase::Connect() {
+    Close();
+    if (DatabaseFile.IsNil()) {
+        return false;
+    }
+    sqlite3* db = nullptr;
+    const int opened =
+        sqlite3_open_v2(DatabaseFile->NativePath().c_str(), &db, SQLITE_OPEN_READONLY, nullptr);
+    std::shared_ptr<sqlite3> connection(db, sqlite3_close_v2);
+    if (opened != SQLITE_OK) {
+        return false;
+    }
+    sqlite3_busy_timeout(db, kBusyMilliseconds);
+    // Opening is lazy: reading the schema tells whether this is a database that can be read.
+    if (sqlite3_exec(db, "select count(*) from sqlite_master", nullptr, nullptr, nullptr) !=
+        SQLITE_OK) {
+        return false;
+    }
+    connection_ = std::move(connection);
+    return true;
+}
+
+Ref<RecordSet> SQLiteDatabase::SQLSelect(const std::string& statement) {
+    if (!connection_) {
+        return nullptr;
+    }
+    sqlite3_stmt* prepared = nullptr;
+    const char* tail = nullptr;
+    if (sqlite3_prepare_v2(connection_.get(), statement.c_str(), static_cast<int>(statement.size()),
+                           &prepared, &tail) != SQLITE_OK ||
+        !prepared) {
+        return nullptr;
+    }
+    const std::string rest(tail, statement.c_str() + statement.size() - tail);
+    if (!IsBlankTail(connection_.get(), rest.c_str())) {
+        sqlite3_finalize(prepared);
+        return nullptr;
+    }
+    const int first = sqlite3_step(prepared);
+    if (first != SQLITE_ROW && first != SQLITE_DONE) {
+        sqlite3_finalize(prepared);
+        return nullptr;
+    }
+    return New<RecordSet>(connection_, prepared, first == SQLITE_DONE);
+}
+
+void SQLiteDatabase::Close() {
+    connection_.reset();
+}

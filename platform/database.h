@@ -1,0 +1,64 @@
+// SQLiteDatabase, RecordSet and DatabaseField: reading one SQLite file. The connection is
+// read-only and never creates a file; a record set steps its cursor as the caller moves and
+// never holds the whole result.
+#pragma once
+
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "platform/folder_item.h"
+#include "platform/ref.h"
+
+struct sqlite3;
+struct sqlite3_stmt;
+
+class DatabaseField {
+  public:
+    explicit DatabaseField(std::string value) : value_(std::move(value)) {}
+    // The column's value as text; a NULL is the empty text.
+    std::string StringValue() const { return value_; }
+    operator std::string() const { return value_; }
+
+  private:
+    std::string value_;
+};
+
+class RecordSet {
+  public:
+    RecordSet(std::shared_ptr<sqlite3> connection, sqlite3_stmt* statement, bool atEnd);
+    ~RecordSet();
+    RecordSet(const RecordSet&) = delete;
+    RecordSet& operator=(const RecordSet&) = delete;
+
+    // EOF of the platform (EOF itself is a macro of the C library): true behind the last row.
+    bool Eof() const { return atEnd_; }
+    // The column of the current row, found by name, case aside; Nil for no such column.
+    Ref<DatabaseField> Field(const std::string& name) const;
+    void MoveNext();
+    void Close();
+
+  private:
+    std::shared_ptr<sqlite3> connection_;
+    sqlite3_stmt* statement_;
+    bool atEnd_;
+    std::vector<std::string> columns_;
+};
+
+class SQLiteDatabase {
+  public:
+    Ref<FolderItem> DatabaseFile;
+
+    // Opens DatabaseFile read-only; true if it can now be queried. A busy or locked file is
+    // waited on for at most kBusyMilliseconds.
+    bool Connect();
+    // Runs one statement. Nil if it fails, or if any statement follows it in the text.
+    Ref<RecordSet> SQLSelect(const std::string& statement);
+    // Harmless on an object that never connected.
+    void Close();
+
+    static constexpr int kBusyMilliseconds = 2000;
+
+  private:
+    std::shared_ptr<sqlite3> connection_;
+};

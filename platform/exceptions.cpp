@@ -1,0 +1,40 @@
+// Exception helpers of the run-time: the global helper, the last resort, yield and stack check.
+#include "platform/exceptions.h"
+
+#include <cstdio>
+
+std::shared_ptr<RuntimeException> _CallFunctionWithExceptionHandling(
+    const std::function<void(void*)>& function, void* argument) {
+    try {
+        function(argument);
+        return nullptr;
+    } catch (const RuntimeException& e) {
+        return std::make_shared<RuntimeException>(e);
+    }
+}
+
+void _UnhandledException(const RuntimeException& exception) {
+    std::fprintf(stderr, "Unhandled %s\n", exception.ClassName().c_str());
+    std::fflush(stderr);
+}
+
+// There is no other thread of the run-time to give way to, so the yield has nothing to do.
+void RuntimeBackgroundTask() {}
+
+namespace {
+int depth = 0;
+}
+
+// A depth limit stands in for the stack test: 32 levels is deeper than any plug-in bundle
+// and below the 40 symbolic links that the kernel resolves in one path, so a link that
+// points back up the tree ends here rather than in a file error.
+StackCheck::StackCheck() {
+    if (depth >= kMaxDepth) {
+        throw StackOverflowException("Stack overflow");
+    }
+    ++depth;
+}
+
+StackCheck::~StackCheck() {
+    --depth;
+}

@@ -1,0 +1,78 @@
+// The run-time's exception classes, the two exception-handling calls and the cooperative yield.
+#pragma once
+
+#include <exception>
+#include <functional>
+#include <memory>
+#include <string>
+
+class RuntimeException : public std::exception {
+  public:
+    explicit RuntimeException(std::string message = {}) : Message(std::move(message)) {}
+    virtual std::string ClassName() const { return "RuntimeException"; }
+    const char* what() const noexcept override { return Message.c_str(); }
+
+    long long ErrorNumber = 0;
+    std::string Message;
+};
+
+// Each subclass names itself, so that the last resort can say which class reached it.
+class NilObjectException : public RuntimeException {
+  public:
+    using RuntimeException::RuntimeException;
+    std::string ClassName() const override { return "NilObjectException"; }
+};
+class IllegalCastException : public RuntimeException {
+  public:
+    using RuntimeException::RuntimeException;
+    std::string ClassName() const override { return "IllegalCastException"; }
+};
+class OutOfBoundsException : public RuntimeException {
+  public:
+    using RuntimeException::RuntimeException;
+    std::string ClassName() const override { return "OutOfBoundsException"; }
+};
+class StackOverflowException : public RuntimeException {
+  public:
+    using RuntimeException::RuntimeException;
+    std::string ClassName() const override { return "StackOverflowException"; }
+};
+class ThreadAccessingUIException : public RuntimeException {
+  public:
+    using RuntimeException::RuntimeException;
+    std::string ClassName() const override { return "ThreadAccessingUIException"; }
+};
+class EndException : public RuntimeException {
+  public:
+    using RuntimeException::RuntimeException;
+    std::string ClassName() const override { return "EndException"; }
+};
+class ThreadEndException : public RuntimeException {
+  public:
+    using RuntimeException::RuntimeException;
+    std::string ClassName() const override { return "ThreadEndException"; }
+};
+
+// The global exception helper that _Main installs: runs `function(argument)` and hands back a
+// RuntimeException that left it, or nullptr. Anything else goes on up.
+std::shared_ptr<RuntimeException> _CallFunctionWithExceptionHandling(
+    const std::function<void(void*)>& function, void* argument);
+
+// The platform's last resort for an exception that reached the top: one line naming the
+// exception's class on stderr, and the program goes on.
+void _UnhandledException(const RuntimeException& exception);
+
+// The cooperative yield at the end of each pass of a long loop.
+void RuntimeBackgroundTask();
+
+// Entry check of a recursive function: counts nesting and raises StackOverflowException
+// before the recursion can exhaust the real stack.
+class StackCheck {
+  public:
+    StackCheck();
+    ~StackCheck();
+    StackCheck(const StackCheck&) = delete;
+    StackCheck& operator=(const StackCheck&) = delete;
+
+    static constexpr int kMaxDepth = 32;
+};

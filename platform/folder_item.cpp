@@ -1,0 +1,202 @@
+// FolderItem over std::filesystem. Every operation uses the error-code forms: a failure of
+// the file system never raises here, it shows in Exists, Directory and Count.
+#include "platform/folder_item.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <system_error>
+
+namespace fs = std::filesystem;
+
+namespace {
+
+fs::path resourcesForTesting;
+
+std::string WithoutTrailingSlashes(std::string path) {
+    while (path.size() > 1 && path.back() == '/') {
+        path.pop_back();
+    }
+    return path;
+}
+
+std::string Unescape(const std::string& shellPath) {
+    std::string out;
+    for (size_t i = 0; i < shellPath.size(); ++i) {
+        if (shellPath[i] == '\\' && i + 1 < shellPath.size()) {
+            ++i;
+        }
+        out += shellPath[i];
+    }
+    return out;
+}
+
+fs::path ExecutablePath() {
+    std::error_code error;
+    return fs::read_symlink("/proc/self/exe", error);
+}
+
+Ref<FolderItem> MakeFromNative(const std::string& native) {
+    if (native.empty() || native[0] != '/') {
+        return nullptr;
+    }
+    return New<FolderItem>(fs::path(native));
+}
+
+}  // namespace
+
+FolderItem::FolderItem(fs::path nativePath) : path_(WithoutTrailingSlashes(nativePath.string())) {}
+
+Ref<FolderItem> FolderItem::Child(const std::string& name) const {
+    if (name.empty()) {
+        return nullptr;
+    }
+    return New<FolderItem>(path_ / name);
+}
+
+Ref<FolderItem> FolderItem::Item(long long index) const {
+    const auto& children = Children();
+    if (index < 1 || index > static_cast<long long>(children.size())) {
+        return nullptr;
+    }
+    return New<FolderItem>(path_ / children[static_cast<size_t>(index - 1)]);
+}
+
+long long FolderItem::Count() const {
+    return static_cast<long long>(Children().size());
+}
+
+std::string FolderItem::Name() const {
+    return path_.filename().string();
+}
+
+// A symbolic link counts as something at the path even if it leads nowhere.
+bool FolderItem::Exists() const {
+    std::error_code error;
+    return fs::exists(fs::symlink_status(path_, error));
+}
+
+bool FolderItem::Directory() const {
+    std::error_code error;
+    return fs::is_directory(path_, error);
+}
+
+std::string FolderItem::ShellPath() const {
+    std::string path = path_.string();
+    const std::string root = FileSystemRoot().string();
+    if (!root.empty() && path.compare(0, root.size(), root) == 0 &&
+        (path.size() == root.size() || path[root.size()] == '/')) {
+        path.erase(0, root.size());
+        if (path.empty()) {
+            path = "/";
+        }
+    }
+    std::string out;
+    for (char c : path) {
+        if (c == ' ' || c == '\\') {
+            out += '\\';
+        }
+        out += c;
+    }
+    return out;
+}
+
+// An item of that name already in the destination is replaced, so that a second install
+// really installs the new plug-in.
+void FolderItem::CopyFileTo(const Ref<FolderItem>& destination) const {
+    const fs::path target =
+        destination->Directory() ? destination->path_ / path_.filename() : destination->path_;
+    std::error_code error;
+    if (fs::is_directory(path_, error)) {
+        fs::copy(path_, target, fs::copy_options::recursive | fs::copy_options::overwrite_existing,
+                 error);
+    } else {
+        fs::copy_file(path_, target, fs::copy_options::overwrite_existing, error);
+    }
+}
+
+void FolderItem::CreateAsFolder() const {
+    std::error_code error;
+    fs::create_directory(path_, error);
+}
+
+// Children are sorted by name, so that the order is the same on every machine.
+const std::vector<std::string>& FolderItem::Children() const {
+    std::error_code error;
+    const auto stamp = fs::last_write_time(path_, error);
+    if (error) {
+        children_.clear();
+        childrenRead_ = false;
+        return children_;
+    }
+    if (childrenRead_ && stamp == childrenStamp_) {
+        return children_;
+    }
+    children_.clear();
+    for (fs::directory_iterator it(path_, error), end; !error && it != end; it.increment(error)) {
+        children_.push_back(it->path().filename().string());
+    }
+    std::sort(children_.begin(), children_.end());
+    childrenStamp_ = stamp;
+    childrenRead_ = true;
+    return children_;
+}
+
+Ref<FolderItem> GetFolderItem(const std::string& path, long long mode) {
+    if (mode == 3) {
+        return MakeFromNative(path);
+    }
+    if (mode != 1) {
+        return nullptr;
+    }
+    const std::string logical = Unescape(path);
+    if (logical.empty() || logical[0] != '/') {
+        return nullptr;
+    }
+    return MakeFromNative(FileSystemRoot().string() + logical);
+}
+
+Ref<FolderItem> SpecialFolder::Resources() {
+    static Ref<FolderItem> resources;
+    fs::path folder = resourcesForTesting;
+    if (folder.empty()) {
+        const fs::path executable = ExecutablePath();
+#ifdef __APPLE__
+        folder = executable.parent_path().parent_path() / "Resources";
+#else
+        folder = executable.parent_path() / (executable.filename().string() + " Resources");
+#endif
+    }
+    // Made once, and again only when the one made before no longer exists or has moved.
+    if (resources.IsNil() || !resources->Exists() || resources->NativePath() != folder) {
+        resources = GetFolderItem(folder.string(), 3);
+    }
+    return resources;
+}
+
+Ref<FolderItem> SpecialFolder::ApplicationData() {
+    const fs::path root = FileSystemRoot();
+    if (!root.empty()) {
+        return GetFolderItem((root / "Users/user/Library/Application Support").string(), 3);
+    }
+    const char* home = std::getenv("HOME");
+#ifdef __APPLE__
+    return home ? GetFolderItem(std::string(home) + "/Library/Application Support", 3) : nullptr;
+#else
+    if (const char* xdg = std::getenv("XDG_DATA_HOME"); xdg && *xdg) {
+        return GetFolderItem(xdg, 3);
+    }
+    return home ? GetFolderItem(std::string(home) + "/.local/share", 3) : nullptr;
+#endif
+}
+
+fs::path FileSystemRoot() {
+    const char* root = std::getenv("ORBELANE_ROOT");
+    if (!root || !*root) {
+        return {};
+    }
+    return fs::path(WithoutTrailingSlashes(root));
+}
+
+void SetResourcesFolderForTesting(const fs::path& folder) {
+    resourcesForTesting = folder;
+}

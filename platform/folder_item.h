@@ -1,0 +1,60 @@
+// FolderItem: a path in the file system, whether or not anything stands there, and the
+// functions that make one. Off macOS, the system's absolute paths (the results store,
+// /Applications, application data) lie under the root that ORBELANE_ROOT names; the logic
+// never sees that root: ShellPath leaves it out and GetFolderItem puts it back.
+#pragma once
+
+#include <filesystem>
+#include <string>
+#include <vector>
+
+#include "platform/ref.h"
+
+class FolderItem {
+  public:
+    explicit FolderItem(std::filesystem::path nativePath);
+
+    // The item of that name directly below this one; it need not exist. Nil for no name.
+    Ref<FolderItem> Child(const std::string& name) const;
+    // Child number `index` from 1 to Count, in the order of their names; Nil outside.
+    Ref<FolderItem> Item(long long index) const;
+    long long Count() const;
+    std::string Name() const;
+    bool Exists() const;
+    bool Directory() const;
+    // The absolute path with a backslash before each blank and each backslash.
+    std::string ShellPath() const;
+    const std::filesystem::path& NativePath() const { return path_; }
+    // Copies this item into `destination` under its own name when that is a folder, or to
+    // that path otherwise. A failure is not raised: a later Exists tells.
+    void CopyFileTo(const Ref<FolderItem>& destination) const;
+    // Creates a folder here; where one stands already, it does nothing.
+    void CreateAsFolder() const;
+
+  private:
+    const std::vector<std::string>& Children() const;
+
+    std::filesystem::path path_;
+    // The sorted names of the children, read again only when the folder has changed, so that
+    // a loop that asks Count and Item at each pass reads the folder once.
+    mutable std::vector<std::string> children_;
+    mutable std::filesystem::file_time_type childrenStamp_;
+    mutable bool childrenRead_ = false;
+};
+
+// Mode 1: a shell path, where a backslash escapes the character behind it. Mode 3: a native
+// path, nothing escaped. Nil for another mode or a path that is not absolute.
+Ref<FolderItem> GetFolderItem(const std::string& path, long long mode);
+
+namespace SpecialFolder {
+// The application's own resources: Contents/Resources of the bundle on macOS; elsewhere the
+// folder beside the executable named after it with " Resources" behind.
+Ref<FolderItem> Resources();
+// The user's application data folder.
+Ref<FolderItem> ApplicationData();
+}  // namespace SpecialFolder
+
+// The root under which absolute paths lie: ORBELANE_ROOT, or empty for the real file system.
+std::filesystem::path FileSystemRoot();
+// Tests give the resources folder of the program under test; an empty path restores it.
+void SetResourcesFolderForTesting(const std::filesystem::path& folder);

@@ -1,0 +1,241 @@
+// Listbox over QTreeView: fixed columns, a heading that sorts, and a delegate that lets the
+// CellBackgroundPaint event paint the ground of each cell before the list draws its text.
+#include "platform/listbox.h"
+
+#include <QHeaderView>
+#include <QPainter>
+#include <QStyledItemDelegate>
+#include <QTreeView>
+
+#include "platform/application.h"
+#include "platform/list_model.h"
+
+namespace {
+
+class CellDelegate : public QStyledItemDelegate {
+  public:
+    explicit CellDelegate(Listbox& owner) : owner_(&owner) {}
+    void Forget() { owner_ = nullptr; }
+
+    void paint(QPainter* painter, const QStyleOptionViewItem& option,
+               const QModelIndex& index) const override {
+        if (owner_ && owner_->CellBackgroundPaint && PaintGround(*painter, option, index)) {
+            return;
+        }
+        QStyledItemDelegate::paint(painter, option, index);
+    }
+
+    QSize sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const override {
+        QSize size = QStyledItemDelegate::sizeHint(option, index);
+        if (owner_) {
+            size.setHeight(owner_->Model().RowHeight());
+        }
+        return size;
+    }
+
+  private:
+    // Raises the event on a Graphics that covers the cell; true if the handler took it over.
+    bool PaintGround(QPainter& painter, const QStyleOptionViewItem& option,
+                     const QModelIndex& index) const {
+        painter.save();
+        painter.translate(option.rect.topLeft());
+        painter.setClipRect(0, 0, option.rect.width(), option.rect.height());
+        const QColor base = option.palette.color(QPalette::Base);
+        auto g = New<Graphics>(painter, option.rect.width(), option.rect.height(),
+                               RGB(base.red(), base.green(), base.blue()));
+        Listbox& list = *owner_;
+        const bool handled = RaiseBooleanEvent(
+            [&] { return list.CellBackgroundPaint(list, g, index.row(), index.column()); });
+        painter.restore();
+        return handled;
+    }
+
+    Listbox* owner_;
+};
+
+std::vector<int> ParseWidths(const std::string& text) {
+    std::vector<int> widths;
+    size_t start = 0;
+    while (start <= text.size()) {
+        const size_t comma = std::min(text.find(',', start), text.size());
+        widths.push_back(std::atoi(text.substr(start, comma - start).c_str()));
+        start = comma + 1;
+    }
+    return widths;
+}
+
+QTreeView& View(QWidget& widget) {
+    return static_cast<QTreeView&>(widget);
+}
+
+}  // namespace
+
+Listbox::Listbox() : model_(std::make_unique<ListModel>()) {
+    auto* view = new QTreeView;
+    view->setRootIsDecorated(false);
+    view->setIndentation(0);
+    view->setUniformRowHeights(true);
+    view->setItemsExpandable(false);
+    view->setAllColumnsShowFocus(true);
+    view->setSelectionMode(QAbstractItemView::SingleSelection);
+    view->setSelectionBehavior(QAbstractItemView::SelectRows);
+    view->setEditTriggers(QAbstractItemView::NoEditTriggers);
+    view->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+    view->setModel(model_.get());
+    view->setItemDelegate(new CellDelegate(*this));
+    view->header()->setSectionsMovable(false);
+    view->header()->setSectionsClickable(true);
+    view->header()->setSortIndicatorShown(false);
+    view->header()->setStretchLastSection(false);
+    SetWidget(view);
+
+    QObject::connect(view->header(), &QHeaderView::sectionClicked, view,
+                     [this](int column) { PressHeading(column); });
+    QObject::connect(view, &QTreeView::doubleClicked, view, [this] {
+        if (DoubleClick) {
+            RaiseEvent([this] { DoubleClick(*this); });
+        }
+    });
+    QObject::connect(view->selectionModel(), &QItemSelectionModel::selectionChanged, view, [this] {
+        if (Change) {
+            RaiseEvent([this] { Change(*this); });
+        }
+    });
+}
+
+Listbox::~Listbox() = default;
+
+void Listbox::DetachWidget() {
+    if (auto* view = static_cast<QTreeView*>(Widget())) {
+        static_cast<CellDelegate*>(view->itemDelegate())->Forget();
+        // The model goes with the view, which may still be on its way out.
+        model_.release()->setParent(view);
+    }
+    Control::DetachWidget();
+}
+
+void Listbox::SetProperty(const std::string& name, const PropertyValue& value) {
+    Control::SetProperty(name, value);
+    QTreeView& view = View(LiveWidget());
+    if (name == "ColumnCount" || name == "InitialValue") {
+        QStringList headings = QString::fromStdString(StringProperty("InitialValue")).split('\t');
+        const int count = static_cast<int>(IntegerProperty("ColumnCount"));
+        while (headings.size() < count) {
+            headings.append(QString());
+        }
+        Rows().SetColumns(headings.mid(0, std::max(count, 1)));
+    } else if (name == "ColumnWidths") {
+        const auto widths = ParseWidths(std::get<std::string>(value));
+        for (size_t i = 0; i < widths.size(); ++i) {
+            view.setColumnWidth(static_cast<int>(i), widths[i]);
+        }
+    } else if (name == "ColumnsResizable") {
+        view.header()->setSectionResizeMode(std::get<bool>(value) ? QHeaderView::Interactive
+                                                                  : QHeaderView::Fixed);
+    } else if (name == "HasHeading") {
+        view.setHeaderHidden(!std::get<bool>(value));
+    } else if (name == "DefaultRowHeight") {
+        Rows().SetRowHeight(static_cast<int>(std::get<long long>(value)));
+    } else if (name == "ScrollBarVertical") {
+        view.setVerticalScrollBarPolicy(std::get<bool>(value) ? Qt::ScrollBarAsNeeded
+                                                              : Qt::ScrollBarAlwaysOff);
+    } else if (name == "Border") {
+        view.setFrameShape(std::get<bool>(value) ? QFrame::StyledPanel : QFrame::NoFrame);
+    }
+}
+
+void Listbox::DeleteAllRows() {
+    Rows().Reset();
+}
+
+void Listbox::AddRow(const std::vector<std::string>& texts) {
+    RowStore& store = Rows().Store();
+    store.AddRow();
+    const size_t row = store.Count() - 1;
+    for (size_t i = 0; i < texts.size() && static_cast<int>(i) < Rows().Columns(); ++i) {
+        store.SetField(row, static_cast<int>(i), texts[i]);
+    }
+    Rows().RowAdded();
+}
+
+long long Listbox::LastIndex() const {
+    return static_cast<long long>(Rows().Store().Count()) - 1;
+}
+
+long long Listbox::ListCount() const {
+    return static_cast<long long>(Rows().Store().Count());
+}
+
+std::string Listbox::Cell(long long row, long long column) const {
+    CheckCell(row, column);
+    return std::string(Rows().Store().Field(static_cast<size_t>(row), static_cast<int>(column)));
+}
+
+void Listbox::SetCell(long long row, long long column, const std::string& text) {
+    CheckCell(row, column);
+    Rows().Store().SetField(static_cast<size_t>(row), static_cast<int>(column), text);
+    Rows().CellChanged(static_cast<size_t>(row), static_cast<int>(column));
+}
+
+Variant Listbox::RowTag(long long row) const {
+    CheckCell(row, 0);
+    return StringToVariant(
+        std::string(Rows().Store().Field(static_cast<size_t>(row), Rows().Columns())));
+}
+
+void Listbox::SetRowTag(long long row, const Variant& tag) {
+    CheckCell(row, 0);
+    Rows().Store().SetField(static_cast<size_t>(row), Rows().Columns(), VariantToString(tag));
+}
+
+long long Listbox::ListIndex() const {
+    const QModelIndexList selected = View(LiveWidget()).selectionModel()->selectedRows();
+    return selected.isEmpty() ? -1 : selected.first().row();
+}
+
+void Listbox::SetListIndex(long long row) {
+    QTreeView& view = View(LiveWidget());
+    Rows().Flush();
+    if (row < 0) {
+        view.clearSelection();
+        return;
+    }
+    CheckCell(row, 0);
+    view.setCurrentIndex(Rows().index(static_cast<int>(row), 0));
+}
+
+std::string Listbox::Heading(long long column) const {
+    return Rows().Heading(static_cast<int>(column)).toStdString();
+}
+
+void Listbox::PressHeading(long long column) {
+    const bool again = Rows().SortColumn() == column;
+    const Qt::SortOrder order = again && Rows().SortOrder() == Qt::AscendingOrder
+                                    ? Qt::DescendingOrder
+                                    : Qt::AscendingOrder;
+    QTreeView& view = View(LiveWidget());
+    view.header()->setSortIndicatorShown(true);
+    view.header()->setSortIndicator(static_cast<int>(column), order);
+    Rows().sort(static_cast<int>(column), order);
+}
+
+long long Listbox::SortColumn() const {
+    return Rows().SortColumn();
+}
+
+bool Listbox::SortDescending() const {
+    return Rows().SortOrder() == Qt::DescendingOrder;
+}
+
+ListModel& Listbox::Rows() const {
+    if (!model_) {
+        throw NilObjectException("The list's window is gone");
+    }
+    return *model_;
+}
+
+void Listbox::CheckCell(long long row, long long column) const {
+    if (row < 0 || row >= ListCount() || column < 0 || column >= Rows().Columns()) {
+        throw OutOfBoundsException("List cell out of bounds");
+    }
+}

@@ -1,0 +1,91 @@
+// Appearance notifications. Off macOS, Qt's palette and theme change events stand in for the
+// two distributed notifications of the desktop.
+#include "platform/notifications.h"
+
+#include <QApplication>
+#include <QEvent>
+#include <QObject>
+#include <QWidget>
+
+#include <algorithm>
+
+#include "platform/application.h"
+#include "platform/timer.h"
+
+std::deque<std::string> _MacOSDistributedNotifications::NotificationQueue;
+std::vector<Application*> _MacOSDistributedNotifications::dispatchTo;
+
+namespace {
+
+class Observer : public QObject {
+  public:
+    bool eventFilter(QObject* watched, QEvent* event) override {
+        if (watched == qApp && event->type() == QEvent::ApplicationPaletteChange) {
+            _MacOSDistributedNotifications::gotCalled(
+                _MacOSDistributedNotifications::kColorPreferencesChanged);
+        } else if (event->type() == QEvent::ThemeChange && watched->isWidgetType() &&
+                   static_cast<QWidget*>(watched)->isWindow() && !themeQueued_) {
+            // Qt tells every top-level window; the desktop said it once.
+            themeQueued_ = true;
+            Timer::CallLater(0, [this] { themeQueued_ = false; });
+            _MacOSDistributedNotifications::gotCalled(
+                _MacOSDistributedNotifications::kThemeChanged);
+        }
+        return false;
+    }
+
+  private:
+    bool themeQueued_ = false;
+};
+
+Observer* mObserverInstance = nullptr;
+
+}  // namespace
+
+void _MacOSDistributedNotifications::Register(Application* client) {
+    if (!mObserverInstance && !Setup()) {
+        return;
+    }
+    dispatchTo.push_back(client);
+}
+
+void _MacOSDistributedNotifications::Unregister(Application* client) {
+    dispatchTo.erase(std::remove(dispatchTo.begin(), dispatchTo.end(), client), dispatchTo.end());
+}
+
+bool _MacOSDistributedNotifications::Setup() {
+    if (mObserverInstance) {
+        return true;
+    }
+    if (!qApp) {
+        return false;
+    }
+    mObserverInstance = new Observer;
+    mObserverInstance->setParent(qApp);
+    qApp->installEventFilter(mObserverInstance);
+    return true;
+}
+
+void _MacOSDistributedNotifications::gotCalled(const std::string& name) {
+    NotificationQueue.push_back(name);
+    Timer::CallLater(0, [] { SendToClients(); });
+}
+
+void _MacOSDistributedNotifications::SendToClients() {
+    while (!NotificationQueue.empty()) {
+        const std::string name = NotificationQueue.front();
+        for (size_t i = 0; i < dispatchTo.size(); ++i) {
+            Application* client = dispatchTo[i];
+            RaiseEvent([client, &name] { client->_MacOSNotificationReceived(name); });
+        }
+        NotificationQueue.pop_front();
+    }
+    // The repaint of what follows the appearance is the platform's: rows and frames that are
+    // on the screen are drawn again with the new answers.
+    for (QWidget* window : QApplication::topLevelWidgets()) {
+        window->update();
+        for (QWidget* child : window->findChildren<QWidget*>()) {
+            child->update();
+        }
+    }
+}

@@ -1,0 +1,144 @@
+// Packed rows: a record is, for each field, a varint length and the bytes.
+#include "platform/row_store.h"
+
+#include <algorithm>
+#include <cstring>
+#include <numeric>
+
+#include "platform/text.h"
+
+namespace {
+
+void PutLength(std::string& out, size_t length) {
+    while (length >= 0x80) {
+        out += static_cast<char>((length & 0x7F) | 0x80);
+        length >>= 7;
+    }
+    out += static_cast<char>(length);
+}
+
+size_t GetLength(const char*& at) {
+    size_t length = 0;
+    for (int shift = 0;; shift += 7) {
+        const auto byte = static_cast<unsigned char>(*at++);
+        length |= static_cast<size_t>(byte & 0x7F) << shift;
+        if (byte < 0x80) {
+            return length;
+        }
+    }
+}
+
+std::string_view FieldOf(const char* record, int field) {
+    const char* at = record;
+    for (int i = 0;; ++i) {
+        const size_t length = GetLength(at);
+        if (i == field) {
+            return {at, length};
+        }
+        at += length;
+    }
+}
+
+char Fold(char c) {
+    return (c >= 'A' && c <= 'Z') ? static_cast<char>(c + 32) : c;
+}
+
+// Byte order with ASCII letters folded; other text goes to the run-time's comparison.
+int CompareForSort(std::string_view a, std::string_view b) {
+    const size_t n = std::min(a.size(), b.size());
+    for (size_t i = 0; i < n; ++i) {
+        if ((static_cast<unsigned char>(a[i]) | static_cast<unsigned char>(b[i])) >= 0x80) {
+            return RuntimeStringCompare(a.substr(i), b.substr(i));
+        }
+        const char ca = Fold(a[i]);
+        const char cb = Fold(b[i]);
+        if (ca != cb) {
+            return ca < cb ? -1 : 1;
+        }
+    }
+    return a.size() == b.size() ? 0 : (a.size() < b.size() ? -1 : 1);
+}
+
+}  // namespace
+
+void RowStore::SetFieldCount(int fieldCount) {
+    Clear();
+    fieldCount_ = fieldCount;
+}
+
+void RowStore::AddRow() {
+    rows_.push_back(Append(std::string(fieldCount_, '\0')));
+}
+
+std::string_view RowStore::Field(size_t row, int field) const {
+    return FieldOf(RecordAt(rows_[row]), field);
+}
+
+void RowStore::SetField(size_t row, int field, std::string_view text) {
+    const char* old = RecordAt(rows_[row]);
+    std::string record;
+    for (int i = 0; i < fieldCount_; ++i) {
+        const std::string_view value = i == field ? text : FieldOf(old, i);
+        PutLength(record, value.size());
+        record += value;
+    }
+    if (rows_[row] == lastRecord_ && chunkSizes_.back() == kChunkSize) {
+        // The last record written: write over it rather than leave it behind.
+        used_ = static_cast<size_t>(lastRecord_ & 0xFFFFFFFF);
+    }
+    rows_[row] = Append(record);
+}
+
+void RowStore::Clear() {
+    chunks_.clear();
+    chunkSizes_.clear();
+    rows_.clear();
+    rows_.shrink_to_fit();
+    used_ = 0;
+    lastRecord_ = UINT64_MAX;
+}
+
+std::vector<uint32_t> RowStore::SortBy(int field, bool descending) {
+    std::vector<uint32_t> order(rows_.size());
+    std::iota(order.begin(), order.end(), 0u);
+    std::stable_sort(order.begin(), order.end(), [&](uint32_t a, uint32_t b) {
+        const int c = CompareForSort(Field(a, field), Field(b, field));
+        return descending ? c > 0 : c < 0;
+    });
+    std::vector<uint64_t> sorted(rows_.size());
+    for (size_t i = 0; i < order.size(); ++i) {
+        sorted[i] = rows_[order[i]];
+    }
+    rows_ = std::move(sorted);
+    lastRecord_ = UINT64_MAX;
+    return order;
+}
+
+size_t RowStore::Bytes() const {
+    size_t bytes = rows_.capacity() * sizeof(uint64_t);
+    for (size_t size : chunkSizes_) {
+        bytes += size;
+    }
+    return bytes;
+}
+
+// A location is the chunk's number in the high half and the offset in the low half.
+uint64_t RowStore::Append(std::string_view record) {
+    if (chunks_.empty() || chunkSizes_.back() != kChunkSize || used_ + record.size() > kChunkSize) {
+        const size_t size = std::max(kChunkSize, record.size());
+        chunks_.push_back(std::make_unique<char[]>(size));
+        chunkSizes_.push_back(size);
+        used_ = 0;
+    }
+    std::memcpy(chunks_.back().get() + used_, record.data(), record.size());
+    lastRecord_ = (static_cast<uint64_t>(chunks_.size() - 1) << 32) | used_;
+    used_ += record.size();
+    if (chunkSizes_.back() != kChunkSize) {
+        used_ = chunkSizes_.back();  // an oversized record has its chunk to itself
+    }
+    return lastRecord_;
+}
+
+const char* RowStore::RecordAt(uint64_t location) const {
+    return chunks_[location >> 32].get() + (location & 0xFFFFFFFF);
+}

@@ -1,0 +1,94 @@
+// Start-up and lifecycle of the run-time over QApplication.
+#include "platform/runtime.h"
+
+#include <QApplication>
+#include <QTimer>
+
+#include "platform/application.h"
+#include "platform/window.h"
+
+namespace {
+ExceptionHelper exceptionHelper = nullptr;
+double releaseStamp = 0.0;
+std::function<void()> pendingLateStartup;
+int exitStatus = 0;
+std::unique_ptr<QApplication> ownApplication;
+
+int argcKept = 0;
+}  // namespace
+
+void RuntimeInit(int argc, char** argv) {
+    if (QApplication::instance()) {
+        return;
+    }
+    argcKept = argc;
+    ownApplication = std::make_unique<QApplication>(argcKept, argv);
+    // On macOS the application lives on with its menu bar when the window closes; elsewhere
+    // a program without a window would have no way left to quit, so it ends with its window.
+#ifdef Q_OS_MACOS
+    QApplication::setQuitOnLastWindowClosed(false);
+#endif
+}
+
+// C++ has run every static initialiser before main; the Qt classes need none.
+void RuntimePerformInitializers() {}
+
+void _RuntimeSetExceptionHelper(ExceptionHelper helper) {
+    exceptionHelper = helper;
+}
+
+void _RuntimeSetReleaseStamp(double stamp) {
+    releaseStamp = stamp;
+}
+
+double RuntimeReleaseStamp() {
+    return releaseStamp;
+}
+
+// Qt 6 always draws for high-density screens.
+void _SetSupportsHiDPI(bool) {}
+
+// The platform's classes are C++ types, known to the compiler; nothing to make known.
+void _RuntimeInitExternalClasses() {}
+
+// The segmented control is built into this platform layer; no library to bind.
+void _InitPluginEntrypoints() {}
+
+void _RunFrameworkInitialization(std::function<void()> lateStartup) {
+    pendingLateStartup = std::move(lateStartup);
+}
+
+void _RuntimeRun() {
+    // Late start-up and then the application's Open, once each, from the event loop.
+    QTimer::singleShot(0, QApplication::instance(), [] {
+        auto lateStartup = std::exchange(pendingLateStartup, nullptr);
+        if (lateStartup && exceptionHelper) {
+            auto exception = exceptionHelper([&](void*) { lateStartup(); }, nullptr);
+            if (exception) {
+                _UnhandledException(*exception);
+            }
+        } else if (lateStartup) {
+            RaiseEvent(lateStartup);
+        }
+        if (auto app = CurrentApplication()) {
+            RaiseEvent([app] { app->Event_Open(); });
+        }
+    });
+    exitStatus = QApplication::exec();
+}
+
+void RuntimePerformFinalizers() {
+    ReleaseAllWindows();
+    _RuntimeRegisterAppObject(nullptr);
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+}
+
+int RuntimeExit() {
+    ownApplication.reset();
+    return exitStatus;
+}
+
+void QuitMenuAction() {
+    QApplication::closeAllWindows();
+    QApplication::quit();
+}

@@ -1,0 +1,31 @@
+// The run-time operations that start-up calls, in the order in which it calls them, mapped
+// onto Qt's application lifecycle.
+#pragma once
+
+#include <functional>
+#include <memory>
+
+#include "platform/exceptions.h"
+
+using ExceptionHelper = std::shared_ptr<RuntimeException> (*)(const std::function<void(void*)>&,
+                                                              void*);
+
+// Makes the Qt application object unless one exists already (tests make their own).
+void RuntimeInit(int argc, char** argv);
+void RuntimePerformInitializers();
+void _RuntimeSetExceptionHelper(ExceptionHelper helper);
+void _RuntimeSetReleaseStamp(double stamp);
+double RuntimeReleaseStamp();
+void _SetSupportsHiDPI(bool flag);
+void _RuntimeInitExternalClasses();
+void _InitPluginEntrypoints();
+// Keeps `lateStartup`, which _RuntimeRun calls once from the event loop, before the
+// application's Open event.
+void _RunFrameworkInitialization(std::function<void()> lateStartup);
+// Runs the event loop until the application quits.
+void _RuntimeRun();
+void RuntimePerformFinalizers();
+int RuntimeExit();
+
+// Asks the platform to quit: closes the windows and ends the event loop.
+void QuitMenuAction();

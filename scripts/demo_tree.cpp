@@ -1,0 +1,1 @@
+#include "scripts/demo_tree.h"

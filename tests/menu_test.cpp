@@ -1,0 +1,95 @@
+// The menu bar: its structure, its native form in the window, and quitting.
+#include <QAction>
+#include <QMainWindow>
+#include <QMenu>
+#include <QMenuBar>
+#include <QPlainTextEdit>
+
+#include "platform/runtime.h"
+#include "shell/main_menu_bar.h"
+#include "shell/startup.h"
+#include "shell/window1.h"
+#include "support.h"
+
+using namespace testsupport;
+
+namespace {
+class MenuTest : public SlateTest {
+  protected:
+    TempDir tree;
+    ScopedRoot root{tree.Path()};
+};
+
+QMenu* NativeMenu(const Ref<class Window1>& window, const char* name) {
+    auto* bar = static_cast<QMainWindow*>(window->Native())->menuBar();
+    return bar->findChild<QMenu*>(name);
+}
+}  // namespace
+
+TEST_F(MenuTest, TheBarHoldsFileAndEditInOrder) {
+    auto bar = MainMenuBar();
+    EXPECT_EQ(bar, MainMenuBar()) << "built once";
+    ASSERT_EQ(bar->Count(), 2);
+    EXPECT_EQ(bar->Item(0)->Text, "&File");
+    EXPECT_EQ(bar->Item(1)->Text, "&Edit");
+    auto file = bar->Child("FileMenu");
+    ASSERT_EQ(file->Count(), 1);
+    EXPECT_FALSE(Cast<QuitMenuItem>(file->Item(0)).IsNil());
+    EXPECT_EQ(file->Item(0)->KeyboardShortcut, "Cmd+Q");
+
+    const char* names[] = {"EditUndo",  "EditSeparator1", "EditCut",        "EditCopy",
+                           "EditPaste", "EditClear",      "EditSeparator2", "EditSelectAll"};
+    auto edit = bar->Child("EditMenu");
+    ASSERT_EQ(edit->Count(), 8);
+    for (long long i = 0; i < 8; ++i) {
+        EXPECT_EQ(edit->Item(i)->Name, names[i]);
+        EXPECT_TRUE(edit->Item(i)->AutoEnable);
+    }
+    EXPECT_EQ(edit->Item(5)->Text, "&Delete");
+    EXPECT_EQ(edit->Item(5)->KeyboardShortcut, "");
+    EXPECT_FALSE(bar->_Lookup("EditSelectAll").IsNil());
+    EXPECT_TRUE(bar->Child("EditSelectAll").IsNil()) << "Child looks one level down only";
+}
+
+TEST_F(MenuTest, TheWindowShowsTheBarWithSeparatorsAndShortcuts) {
+    _EarlyStartup();
+    auto window = Window1();
+    EXPECT_FALSE(window->FileQuit().IsNil());
+    EXPECT_EQ(window->EditCopy()->Text, "&Copy");
+
+    QMenu* edit = NativeMenu(window, "EditMenu");
+    ASSERT_NE(edit, nullptr);
+    const QList<QAction*> actions = edit->actions();
+    ASSERT_EQ(actions.size(), 8);
+    EXPECT_TRUE(actions[1]->isSeparator());
+    EXPECT_TRUE(actions[6]->isSeparator());
+    EXPECT_EQ(actions[7]->text(), "Select &All");
+    EXPECT_EQ(actions[3]->shortcut(), QKeySequence(QKeySequence::Copy));
+    QMenu* file = NativeMenu(window, "FileMenu");
+    ASSERT_NE(file, nullptr);
+    EXPECT_EQ(file->actions().at(0)->shortcut(), QKeySequence("Ctrl+Q"));
+}
+
+TEST_F(MenuTest, CopyAndSelectAllWorkOnTheFocusedReportText) {
+    _EarlyStartup();
+    auto window = Window1();
+    window->PagePanel1()->SetValue(2);
+    window->TextArea1()->SetText("    Bar 1 330\rBar 2 660");
+    window->Native()->activateWindow();
+    window->TextArea1()->Widget()->setFocus();
+    ProcessEvents();
+    window->EditSelectAll()->Action();
+    auto* editor = static_cast<QPlainTextEdit*>(window->TextArea1()->Widget());
+    EXPECT_EQ(editor->textCursor().selectedText().size(), editor->toPlainText().size());
+}
+
+TEST_F(MenuTest, QuitEndsTheEventLoopAndClosesTheWindow) {
+    _EarlyStartup();
+    auto window = Window1();
+    QMenu* file = NativeMenu(window, "FileMenu");
+    QTimer::singleShot(0, [file] { file->actions().at(0)->trigger(); });
+    QTimer::singleShot(5000, [] { QCoreApplication::exit(1); });
+    EXPECT_EQ(QCoreApplication::exec(), 0);
+    EXPECT_FALSE(window->IsOpen());
+    EXPECT_TRUE(_GetImplicitWindow("Window1.Window1").IsNil());
+}

@@ -1,0 +1,212 @@
+// Start-up, the state machine of pages and segments, and the lifecycle of the window.
+#include <QMainWindow>
+#include <QPushButton>
+
+#include "platform/runtime.h"
+#include "shell/app.h"
+#include "shell/startup.h"
+#include "shell/window1.h"
+#include "support.h"
+
+using namespace testsupport;
+
+namespace {
+
+enum class State { Installing, Listing, Reporting };
+
+State StateOf(const Ref<class Window1>& window) {
+    const long long page = window->PagePanel1()->Value();
+    const bool first = window->MainTabs()->Items()[0]->Selected();
+    const bool second = window->MainTabs()->Items()[1]->Selected();
+    EXPECT_NE(first, second) << "exactly one segment is selected";
+    if (page == 0) {
+        EXPECT_TRUE(first) << "page 0 goes with the first segment";
+        return State::Installing;
+    }
+    EXPECT_TRUE(second) << "pages 1 and 2 go with the second segment";
+    return page == 1 ? State::Listing : State::Reporting;
+}
+
+int VisibleWindows() {
+    int count = 0;
+    for (QWidget* widget : QApplication::topLevelWidgets()) {
+        count += qobject_cast<QMainWindow*>(widget) && widget->isVisible() ? 1 : 0;
+    }
+    return count;
+}
+
+// The start-up that the event loop would run, without the loop.
+Ref<class Window1> StartUp() {
+    _EarlyStartup();
+    _LateStartup();
+    CurrentApplication()->Event_Open();
+    return Window1();
+}
+
+class ShellTest : public SlateTest {
+  protected:
+    TempDir tree;
+    ScopedRoot root{tree.Path()};
+};
+
+}  // namespace
+
+TEST_F(ShellTest, MainLandsInListingWithAnEmptyList) {
+    // The real _Main, with its event loop ended as soon as the window shows the list.
+    QTimer poll;
+    QObject::connect(&poll, &QTimer::timeout, [] {
+        auto window = _GetImplicitWindow("Window1.Window1");
+        if (window && Cast<class Window1>(window)->PagePanel1()->Value() == 1) {
+            QCoreApplication::exit(0);  // quit() would close the window too
+        }
+    });
+    poll.start(10);
+    QTimer::singleShot(5000, [] { QCoreApplication::exit(1); });
+    _Main();
+
+    auto window = Window1();
+    EXPECT_EQ(StateOf(window), State::Listing);
+    EXPECT_EQ(window->Listbox1()->ListCount(), 0);
+    EXPECT_EQ(window->Title(), "Orbelane Verification Storage");
+    EXPECT_TRUE(window->Native()->isVisible());
+    EXPECT_EQ(CurrentApplication()->MajorVersion, 1);
+    EXPECT_EQ(CurrentApplication()->StageCode, 3);
+    EXPECT_DOUBLE_EQ(RuntimeReleaseStamp(), 2018.04);
+}
+
+TEST_F(ShellTest, EitherOrderOfOpenAndLateStartupGivesOneWindowOnTheList) {
+    _EarlyStartup();
+    CurrentApplication()->Event_Open();
+    _LateStartup();
+    EXPECT_EQ(VisibleWindows(), 1);
+    EXPECT_EQ(StateOf(Window1()), State::Listing);
+
+    QApplication::closeAllWindows();
+    ProcessEvents();
+    _EarlyStartup();
+    _LateStartup();
+    EXPECT_EQ(StateOf(Window1()), State::Installing) << "built on page 0 until Open";
+    CurrentApplication()->Event_Open();
+    EXPECT_EQ(VisibleWindows(), 1);
+    EXPECT_EQ(StateOf(Window1()), State::Listing);
+}
+
+TEST_F(ShellTest, AWindowMadeAfterTheFirstClosedStandsInInstalling) {
+    auto first = StartUp();
+    first->Close();
+    ProcessEvents();
+    EXPECT_TRUE(_GetImplicitWindow("Window1.Window1").IsNil());
+    EXPECT_EQ(VisibleWindows(), 0);
+
+    auto second = Window1();
+    EXPECT_NE(second, first);
+    EXPECT_EQ(StateOf(second), State::Installing);
+    EXPECT_EQ(second->MenuBar(), first->MenuBar()) << "the one menu bar serves every window";
+}
+
+TEST_F(ShellTest, TheWindowHasAFixedSizeAndOnlyACloseButton) {
+    auto window = StartUp();
+    QWidget* native = window->Native();
+    EXPECT_EQ(window->Client()->size(), QSize(968, 628));
+    EXPECT_EQ(native->minimumSize(), native->maximumSize());
+    const Qt::WindowFlags flags = native->windowFlags();
+    EXPECT_TRUE(flags & Qt::WindowCloseButtonHint);
+    EXPECT_FALSE(flags & Qt::WindowMinimizeButtonHint);
+    EXPECT_FALSE(flags & Qt::WindowMaximizeButtonHint);
+    EXPECT_FALSE(flags & Qt::WindowFullscreenButtonHint);
+    EXPECT_EQ(window->BackColor(), 0xFFFFFFu);
+}
+
+struct Transition {
+    const char* name;
+    State from;
+    enum { Segment0, Segment1, Close } action;
+    State to;
+};
+
+class TransitionTest : public ShellTest, public ::testing::WithParamInterface<Transition> {};
+
+TEST_P(TransitionTest, FollowsTheStateTable) {
+    const Transition& t = GetParam();
+    auto window = StartUp();
+    if (t.from == State::Installing) {
+        window->MainTabs()->Press(0);
+    } else if (t.from == State::Reporting) {
+        window->PagePanel1()->SetValue(2);  // where a double click that loads leads
+    }
+    ASSERT_EQ(StateOf(window), t.from);
+    switch (t.action) {
+        case Transition::Segment0:
+            window->MainTabs()->Press(0);
+            break;
+        case Transition::Segment1:
+            window->MainTabs()->Press(1);
+            break;
+        case Transition::Close:
+            window->PushButton2()->Push();
+            break;
+    }
+    EXPECT_EQ(StateOf(window), t.to);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    States, TransitionTest,
+    ::testing::Values(
+        Transition{"InstallingSegment1", State::Installing, Transition::Segment1, State::Listing},
+        Transition{"InstallingSegment0", State::Installing, Transition::Segment0,
+                   State::Installing},
+        Transition{"ListingSegment0", State::Listing, Transition::Segment0, State::Installing},
+        Transition{"ListingSegment1", State::Listing, Transition::Segment1, State::Listing},
+        Transition{"ReportingClose", State::Reporting, Transition::Close, State::Listing},
+        Transition{"ReportingSegment1", State::Reporting, Transition::Segment1, State::Listing},
+        Transition{"ReportingSegment0", State::Reporting, Transition::Segment0, State::Installing}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+TEST_F(ShellTest, PagesShowOnlyTheirOwnControls) {
+    auto window = StartUp();
+    auto shown = [&](const Ref<Control>& c) { return c->Widget()->isVisible(); };
+    EXPECT_TRUE(shown(window->Listbox1()));
+    EXPECT_FALSE(shown(window->PushButton1()));
+    EXPECT_FALSE(shown(window->TextArea1()));
+    EXPECT_TRUE(shown(window->MainTabs()));
+
+    window->PagePanel1()->SetValue(2);
+    EXPECT_FALSE(shown(window->Listbox1()));
+    EXPECT_TRUE(shown(window->Label6(8)));
+    EXPECT_TRUE(shown(window->TextArea1())) << "the first tab is chosen";
+    EXPECT_FALSE(shown(window->TextArea2()));
+    window->TabPanel1()->SetValue(1);
+    EXPECT_FALSE(shown(window->TextArea1()));
+    EXPECT_TRUE(shown(window->TextArea2()));
+
+    window->MainTabs()->Press(0);
+    EXPECT_TRUE(shown(window->PushButton1()));
+    EXPECT_TRUE(shown(window->Label1()));
+    EXPECT_FALSE(shown(window->TextArea2()));
+}
+
+TEST_F(ShellTest, ANilUseInAHandlerReachesTheLastResortAndTheProgramGoesOn) {
+    auto window = StartUp();
+    int calls = 0;
+    window->PushButton2()->Action = [&](PushButton&) {
+        ++calls;
+        Ref<FolderItem> nothing;
+        nothing->Exists();
+    };
+    ::testing::internal::CaptureStderr();
+    window->PushButton2()->Push();
+    window->PushButton2()->Push();
+    const std::string printed = ::testing::internal::GetCapturedStderr();
+    EXPECT_EQ(calls, 2);
+    EXPECT_NE(printed.find("NilObjectException"), std::string::npos) << printed;
+    window->MainTabs()->Press(0);
+    EXPECT_EQ(StateOf(window), State::Installing);
+}
+
+TEST_F(ShellTest, EndExceptionLeavesAHandlerWithoutAReport) {
+    _EarlyStartup();
+    ::testing::internal::CaptureStderr();
+    RaiseEvent([] { throw EndException(); });
+    RaiseEvent([] { throw ThreadEndException(); });
+    EXPECT_EQ(::testing::internal::GetCapturedStderr(), "");
+}

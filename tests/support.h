@@ -1,0 +1,105 @@
+// Test support: temporary trees, the file-system root, message capture, and a clean slate of
+// windows and application object for each test.
+#pragma once
+
+#include <QApplication>
+#include <QCoreApplication>
+#include <QEvent>
+#include <QTimer>
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <string>
+#include <vector>
+
+#include "platform/application.h"
+#include "platform/message_box.h"
+#include "platform/window.h"
+
+namespace testsupport {
+
+// A fresh folder under the system's temporary folder, removed with everything in it.
+class TempDir {
+  public:
+    TempDir() {
+        std::string pattern =
+            (std::filesystem::temp_directory_path() / "orbelane-test-XXXXXX").string();
+        path_ = mkdtemp(pattern.data());
+    }
+    ~TempDir() {
+        std::error_code error;
+        std::filesystem::remove_all(path_, error);
+    }
+    TempDir(const TempDir&) = delete;
+    TempDir& operator=(const TempDir&) = delete;
+    const std::filesystem::path& Path() const { return path_; }
+
+  private:
+    std::filesystem::path path_;
+};
+
+// Puts the system's absolute paths under a temporary root for the life of the object.
+class ScopedRoot {
+  public:
+    explicit ScopedRoot(const std::filesystem::path& root) {
+        if (const char* old = std::getenv("ORBELANE_ROOT")) {
+            old_ = old;
+            hadOld_ = true;
+        }
+        setenv("ORBELANE_ROOT", root.c_str(), 1);
+    }
+    ~ScopedRoot() {
+        if (hadOld_) {
+            setenv("ORBELANE_ROOT", old_.c_str(), 1);
+        } else {
+            unsetenv("ORBELANE_ROOT");
+        }
+    }
+
+  private:
+    std::string old_;
+    bool hadOld_ = false;
+};
+
+// Reads every message that MsgBox would show.
+class MessageLog {
+  public:
+    MessageLog() {
+        SetMsgBoxHandlerForTesting([this](const std::string& text) { messages.push_back(text); });
+    }
+    ~MessageLog() { SetMsgBoxHandlerForTesting(nullptr); }
+    std::vector<std::string> messages;
+};
+
+inline void WriteFile(const std::filesystem::path& path, const std::string& bytes) {
+    std::filesystem::create_directories(path.parent_path());
+    std::ofstream(path, std::ios::binary) << bytes;
+}
+
+inline std::string ReadFile(const std::filesystem::path& path) {
+    std::ifstream in(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+}
+
+// Lets queued timers and posted events run.
+inline void ProcessEvents() {
+    for (int i = 0; i < 3; ++i) {
+        QCoreApplication::processEvents();
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    }
+}
+
+// Every test starts and ends without windows and without an application object.
+class SlateTest : public ::testing::Test {
+  protected:
+    void TearDown() override {
+        QApplication::closeAllWindows();
+        ProcessEvents();
+        _RuntimeRegisterAppObject(nullptr);
+    }
+};
+
+}  // namespace testsupport
