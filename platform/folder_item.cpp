@@ -3,6 +3,7 @@
 #include "platform/folder_item.h"
 
 #include <algorithm>
+#include <chrono>
 #include <cstdlib>
 #include <system_error>
 
@@ -128,7 +129,10 @@ const std::vector<std::string>& FolderItem::Children() const {
         childrenRead_ = false;
         return children_;
     }
-    if (childrenRead_ && stamp == childrenStamp_) {
+    // Folder times tick coarsely: a listing made within a tick of the last change may have
+    // missed a later change in the same tick, so it is trusted only once the time is older.
+    constexpr auto kTick = std::chrono::milliseconds(20);
+    if (childrenRead_ && stamp == childrenStamp_ && listedAt_ - stamp > kTick) {
         return children_;
     }
     children_.clear();
@@ -137,6 +141,7 @@ const std::vector<std::string>& FolderItem::Children() const {
     }
     std::sort(children_.begin(), children_.end());
     childrenStamp_ = stamp;
+    listedAt_ = fs::file_time_type::clock::now();
     childrenRead_ = true;
     return children_;
 }

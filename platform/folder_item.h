@@ -39,6 +39,7 @@ class FolderItem {
     // a loop that asks Count and Item at each pass reads the folder once.
     mutable std::vector<std::string> children_;
     mutable std::filesystem::file_time_type childrenStamp_;
+    mutable std::filesystem::file_time_type listedAt_;
     mutable bool childrenRead_ = false;
 };
 

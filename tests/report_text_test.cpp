@@ -1,0 +1,114 @@
+// The readers of the stored report text, on both layouts and the sharp cases.
+#include "results/report_text.h"
+
+#include <gtest/gtest.h>
+
+#include "scripts/demo_tree.h"
+
+namespace {
+
+const std::string kLayoutA =
+    "Code reads 1234567890128\rCode is EAN 13\r\rSymbol Length 29.83 mm\rCode is Sized at 80 "
+    "%\rBWR Measured As 15 mic\rBar Deviance 6 mic\rAll bars within tolerance\rActual "
+    "Measurements = +- mic 0\rBar 1 330\rBar 2 660\rBar/Space Deviances = +- mic 0\rBar 1 "
+    "+4\rBar 2 -2";
+
+std::string LayoutB() {
+    std::string text = kLayoutA;
+    const std::string lineA1 = "Code reads 1234567890128\rCode is EAN 13";
+    text.replace(0, lineA1.size(), "Code is EAN 13\rCode reads 1234567890128");
+    return text;
+}
+
+struct ReaderCase {
+    const char* name;
+    std::string text;
+    std::string listValue;
+    std::string reportValue;
+    std::string codeType;
+    bool report;
+};
+
+class ReadersTest : public ::testing::TestWithParam<ReaderCase> {};
+
+TEST_P(ReadersTest, ReadTheValuesOfLinesOneAndTwo) {
+    const ReaderCase& c = GetParam();
+    EXPECT_EQ(ListReadValue(c.text), c.listValue);
+    EXPECT_EQ(ReportReadValue(c.text), c.reportValue);
+    EXPECT_EQ(ReportCodeType(c.text), c.codeType);
+    EXPECT_EQ(PassesReportTest(c.text), c.report);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Texts, ReadersTest,
+    ::testing::Values(
+        ReaderCase{"LayoutA", kLayoutA, " 1234567890128", " 1234567890128", " EAN 13", true},
+        ReaderCase{"LayoutB", LayoutB(), " 1234567890128", " 1234567890128", " EAN 13", true},
+        ReaderCase{"Empty", "", "", "", "", false},
+        ReaderCase{"CodeReadsOnLineTwoOnly", "Verifier\rCode reads 42", " 42", " 42", "", false},
+        ReaderCase{"OneLineWithoutReturn", "Code reads 42 and more", " 42 and more", " 42 and more",
+                   "", true},
+        ReaderCase{"BothMarkersOnLineOne", "Code reads 42 Code is EAN 8\rnothing",
+                   " 42 Code is EAN 8", " 42 Code is EAN 8", " EAN 8", true},
+        ReaderCase{"SizedAtOnLineOnePassesTheTest", "Code is Sized at 80 %", "", "",
+                   " Sized at 80 %", true},
+        ReaderCase{"ReadValueHoldingTheMarkerIsCut", "Code reads 12 Code reads 34", " 12 ", " 12 ",
+                   "", true},
+        ReaderCase{"EmptyValueOnLineOneListVersusReport", "Code reads\rCode reads 99", "", " 99",
+                   "", true},
+        ReaderCase{"CaseIsIgnored", "CODE READS 7\rcode is UPC A", " 7", " 7", " UPC A", true},
+        ReaderCase{"CrLfEndings", "Code reads 5\r\nCode is EAN 8\r\n", " 5", " 5", " EAN 8", true}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+TEST(ReportText, LinesFourToEightAndTheBlocks) {
+    EXPECT_EQ(SymbolLength(kLayoutA), " 29.83 mm");
+    EXPECT_EQ(Scale(kLayoutA), " 80 %");
+    EXPECT_EQ(Bwr(kLayoutA), " 15 mic");
+    EXPECT_EQ(BarDeviance(kLayoutA), " 6 mic");
+    EXPECT_EQ(FreeLine(kLayoutA), "All bars within tolerance");
+    EXPECT_EQ(MeasurementsBlock(kLayoutA), "\rBar 1 330\rBar 2 660\r");
+    EXPECT_EQ(DeviancesBlock(kLayoutA), "\rBar 1 +4\rBar 2 -2");
+    EXPECT_EQ(SymbolLength(LayoutB()), " 29.83 mm");
+}
+
+TEST(ReportText, AMarkerOnTheWrongLineGivesNothing) {
+    const std::string text = "Code reads 1\rCode is 2\r\rBar Deviance 6\rSymbol Length 3";
+    EXPECT_EQ(SymbolLength(text), "");
+    EXPECT_EQ(BarDeviance(text), "");
+    EXPECT_EQ(Scale(text), "");
+    EXPECT_EQ(FreeLine(text), "");
+}
+
+TEST(ReportText, CrLfCarriesTheLineFeedIntoLineEightAndTheBlocks) {
+    std::string text = kLayoutA;
+    for (size_t at = text.find('\r'); at != std::string::npos; at = text.find('\r', at + 2)) {
+        text.insert(at + 1, "\n");
+    }
+    EXPECT_EQ(SymbolLength(text), " 29.83 mm") << "the line feed stands ahead of the marker";
+    EXPECT_EQ(FreeLine(text), "\nAll bars within tolerance");
+    EXPECT_EQ(MeasurementsBlock(text), "\r\nBar 1 330\r\nBar 2 660\r\n");
+}
+
+TEST(ReportText, MissingAndReversedBlockMarkers) {
+    const std::string noMeasurements = "Code reads 1\rBar/Space Deviances = +- mic 0\rBar 1 +4";
+    EXPECT_EQ(MeasurementsBlock(noMeasurements), "");
+    EXPECT_EQ(DeviancesBlock(noMeasurements), "\rBar 1 +4");
+
+    const std::string noDeviances = "Code reads 1\rActual Measurements = +- mic 0\rBar 1 330";
+    EXPECT_EQ(MeasurementsBlock(noDeviances), "\rBar 1 330");
+    EXPECT_EQ(DeviancesBlock(noDeviances), "");
+
+    const std::string reversed =
+        "x\rBar/Space Deviances = +- mic 0\rD\rActual Measurements = +- mic 0\rM";
+    EXPECT_EQ(MeasurementsBlock(reversed), "\rM");
+    EXPECT_EQ(DeviancesBlock(reversed), "\rD\rActual Measurements = +- mic 0\rM");
+}
+
+TEST(ReportText, TheDemoGeneratorWritesReadableReports) {
+    const std::string text = demo::ReportText(demo::Layout::B, "5012345678900", "EAN 13", 3);
+    EXPECT_EQ(ReportReadValue(text), " 5012345678900");
+    EXPECT_EQ(ReportCodeType(text), " EAN 13");
+    EXPECT_EQ(MeasurementsBlock(text), "\rBar 1 660\rBar 2 990\rBar 3 1320\r");
+}
+
+}  // namespace

@@ -1,0 +1,172 @@
+// The read side of the results store on real SQLite files: the silent early ends, NULLs,
+// missing columns, hostile ids, and a store that is never written.
+#include <sqlite3.h>
+
+#include <chrono>
+
+#include "results/results_store.h"
+#include "scripts/demo_tree.h"
+#include "support.h"
+
+using namespace testsupport;
+
+namespace {
+
+class StoreTest : public ::testing::Test {
+  protected:
+    void Write(const std::vector<demo::StoredResult>& rows,
+               const std::string& schema = demo::kSchema) {
+        demo::WriteStore(store, rows, schema);
+    }
+    int Rows(const std::string& statement) {
+        SQLiteDatabase db;
+        auto rows = OpenStore(db, statement);
+        int count = 0;
+        for (; rows && !rows->Eof(); rows->MoveNext()) {
+            ++count;
+        }
+        db.Close();
+        return count;
+    }
+    TempDir tree;
+    ScopedRoot root{tree.Path()};
+    std::filesystem::path store = demo::StorePath(tree.Path());
+};
+
+struct EarlyEnd {
+    const char* name;
+    void (*make)(const std::filesystem::path& store);
+};
+
+class EarlyEndTest : public StoreTest, public ::testing::WithParamInterface<EarlyEnd> {};
+
+TEST_P(EarlyEndTest, EndsTheReadSilentlyWithinTheBound) {
+    GetParam().make(store);
+    const std::string before = std::filesystem::is_regular_file(store) ? ReadFile(store) : "";
+    const auto start = std::chrono::steady_clock::now();
+    SQLiteDatabase db;
+    EXPECT_TRUE(OpenStore(db, kListQuery).IsNil());
+    db.Close();
+    db.Close();  // harmless, connected or not
+    const auto waited = std::chrono::steady_clock::now() - start;
+    EXPECT_LT(waited, std::chrono::milliseconds(SQLiteDatabase::kBusyMilliseconds + 1000));
+    if (std::filesystem::is_regular_file(store)) {
+        EXPECT_EQ(ReadFile(store), before) << "the store is never written";
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Stores, EarlyEndTest,
+    ::testing::Values(
+        EarlyEnd{"NoFile", [](const auto&) {}},
+        EarlyEnd{"FolderAtThePath", [](const auto& p) { std::filesystem::create_directories(p); }},
+        EarlyEnd{"NotADatabase",
+                 [](const auto& p) { WriteFile(p, "results of last week, typed by hand\n"); }},
+        EarlyEnd{"EmptyTable", [](const auto& p) { demo::WriteStore(p, {}); }},
+        EarlyEnd{"NoSuchTable",
+                 [](const auto& p) { demo::WriteStore(p, {}, "create table other (id text)"); }}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+TEST_F(StoreTest, AStoreLockedByTheWriterEndsSilentlyWithinTheBound) {
+    Write(demo::InventedResults(3));
+    sqlite3* writer = nullptr;
+    ASSERT_EQ(sqlite3_open(store.c_str(), &writer), SQLITE_OK);
+    ASSERT_EQ(sqlite3_exec(writer, "begin exclusive; insert into results_store (id) values ('new')",
+                           nullptr, nullptr, nullptr),
+              SQLITE_OK);
+    const auto start = std::chrono::steady_clock::now();
+    EXPECT_EQ(Rows(kListQuery), 0);
+    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::milliseconds(3000));
+    sqlite3_exec(writer, "rollback", nullptr, nullptr, nullptr);
+    sqlite3_close(writer);
+    EXPECT_EQ(Rows(kListQuery), 3) << "readable again once the writer lets go";
+}
+
+TEST_F(StoreTest, ReadsEveryRowAsTextAndNullAsEmptyText) {
+    Write({{"7", std::nullopt, "Box.ai", std::nullopt, std::nullopt}, {"8", "2018", "", "A", "x"}});
+    SQLiteDatabase db;
+    auto rows = OpenStore(db, kListQuery);
+    ASSERT_FALSE(rows.IsNil());
+    EXPECT_EQ(rows->Field("id")->StringValue(), "7");
+    EXPECT_EQ(std::string(*rows->Field("datetime")), "");
+    EXPECT_EQ(std::string(*rows->Field("DOCUMENT")), "Box.ai") << "names match without case";
+    EXPECT_EQ(std::string(*rows->Field("results")), "");
+    EXPECT_TRUE(rows->Field("no_such_column").IsNil());
+    rows->MoveNext();
+    EXPECT_FALSE(rows->Eof());
+    EXPECT_EQ(std::string(*rows->Field("grade")), "A");
+    rows->MoveNext();
+    EXPECT_TRUE(rows->Eof());
+    rows->Close();
+    db.Close();
+}
+
+TEST_F(StoreTest, NumbersAndBlobsReadAsText) {
+    Write({}, "create table results_store (id integer primary key, datetime real, results blob)");
+    sqlite3* writer = nullptr;
+    sqlite3_open(store.c_str(), &writer);
+    sqlite3_exec(writer, "insert into results_store values (12, 2.5, x'436f6465')", nullptr,
+                 nullptr, nullptr);
+    sqlite3_close(writer);
+    SQLiteDatabase db;
+    auto rows = OpenStore(db, RowQuery("12"));
+    ASSERT_FALSE(rows.IsNil());
+    EXPECT_EQ(rows->Field("id")->StringValue(), "12");
+    EXPECT_EQ(std::string(*rows->Field("datetime")), "2.5");
+    EXPECT_EQ(std::string(*rows->Field("results")), "Code");
+}
+
+TEST_F(StoreTest, ATableWithoutIdGivesNilForThatField) {
+    Write({}, "create table results_store (datetime text, results text)");
+    sqlite3* writer = nullptr;
+    sqlite3_open(store.c_str(), &writer);
+    sqlite3_exec(writer, "insert into results_store values ('2018', 'Code reads 1')", nullptr,
+                 nullptr, nullptr);
+    sqlite3_close(writer);
+    SQLiteDatabase db;
+    auto rows = OpenStore(db, kListQuery);
+    ASSERT_FALSE(rows.IsNil());
+    EXPECT_THROW(rows->Field("id")->StringValue(), NilObjectException);
+}
+
+TEST_F(StoreTest, HostileIdsEndTheReadAndRunNothingElse) {
+    Write(demo::InventedResults(5, false));
+    const std::string before = ReadFile(store);
+    EXPECT_EQ(Rows(RowQuery("it's")), 0);
+    EXPECT_EQ(Rows(RowQuery("x'; delete from results_store; --")), 0);
+    EXPECT_EQ(Rows(RowQuery("x' or '1'='1")), 5) << "a condition in the id is still one statement";
+    EXPECT_EQ(Rows(RowQuery("3")), 1);
+    EXPECT_EQ(Rows(kListQuery), 5);
+    EXPECT_EQ(ReadFile(store), before);
+}
+
+TEST_F(StoreTest, SQLSelectRunsExactlyOneStatement) {
+    Write(demo::InventedResults(2, false));
+    SQLiteDatabase db;
+    db.DatabaseFile = GetFolderItem(kResultsStorePath, 1);
+    ASSERT_TRUE(db.Connect());
+    EXPECT_FALSE(db.SQLSelect("select * from results_store;  -- the list\n").IsNil());
+    EXPECT_TRUE(db.SQLSelect("select * from results_store; select 1").IsNil());
+    EXPECT_TRUE(db.SQLSelect("").IsNil());
+    EXPECT_TRUE(db.SQLSelect("delete from results_store").IsNil()) << "the connection reads only";
+    auto empty = db.SQLSelect("select * from results_store where id = 'none'");
+    ASSERT_FALSE(empty.IsNil());
+    EXPECT_TRUE(empty->Eof());
+    db.Close();
+    EXPECT_TRUE(db.SQLSelect(kListQuery).IsNil());
+}
+
+TEST_F(StoreTest, ARecordSetOutlivesItsDatabase) {
+    Write(demo::InventedResults(3, false));
+    Ref<RecordSet> rows;
+    {
+        SQLiteDatabase db;
+        rows = OpenStore(db, kListQuery);
+        db.Close();
+    }
+    ASSERT_FALSE(rows.IsNil());
+    rows->MoveNext();
+    EXPECT_EQ(rows->Field("id")->StringValue(), "2");
+}
+
+}  // namespace
