@@ -22,7 +22,11 @@ class CellDelegate : public QStyledItemDelegate {
         if (owner_ && owner_->CellBackgroundPaint && PaintGround(*painter, option, index)) {
             return;
         }
-        QStyledItemDelegate::paint(painter, option, index);
+        // The selection moves with the current row, so the style's tint of the focused
+        // current row would only hide the ground of an unselected one.
+        QStyleOptionViewItem plain = option;
+        plain.state &= ~QStyle::State_HasFocus;
+        QStyledItemDelegate::paint(painter, plain, index);
     }
 
     QSize sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const override {
@@ -76,7 +80,7 @@ Listbox::Listbox() : model_(std::make_unique<ListModel>()) {
     view->setIndentation(0);
     view->setUniformRowHeights(true);
     view->setItemsExpandable(false);
-    view->setAllColumnsShowFocus(true);
+    view->setAllColumnsShowFocus(false);
     view->setSelectionMode(QAbstractItemView::SingleSelection);
     view->setSelectionBehavior(QAbstractItemView::SelectRows);
     view->setEditTriggers(QAbstractItemView::NoEditTriggers);

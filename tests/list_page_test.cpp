@@ -1,0 +1,154 @@
+// The list page on the real window: loads on every arrival, never clears on a failed read,
+// stripes by appearance, sorts by heading.
+#include <QHeaderView>
+#include <QImage>
+
+#include <sqlite3.h>
+
+#include "platform/appearance.h"
+#include "window_fixture.h"
+
+using namespace testsupport;
+
+namespace {
+
+demo::StoredResult Result(const std::string& id, const std::string& document,
+                          const std::string& results = "Code reads 42\rCode is EAN 8") {
+    return {id, "2018-11-0" + id, document, "A", results};
+}
+
+class ListPageTest : public WindowTest {};
+
+TEST_F(ListPageTest, StartUpShowsTheStoredRowsInTheirColumns) {
+    Store({Result("1", "Box.ai"),
+           {"2", std::nullopt, std::nullopt, std::nullopt, "Code is UPC A\rCode reads 0361"},
+           {"3", "2018", "Odd.pdf", "F", "No barcode here"}});
+    auto window = StartUp();
+    auto list = window->Listbox1();
+    ASSERT_EQ(list->ListCount(), 3);
+    EXPECT_EQ(Column(window, 0), (std::vector<std::string>{"2018-11-01", "", "2018"}));
+    EXPECT_EQ(Column(window, 1), (std::vector<std::string>{"Box.ai", "", "Odd.pdf"}));
+    EXPECT_EQ(Column(window, 2), (std::vector<std::string>{" 42", " 0361", ""}));
+    EXPECT_EQ(Column(window, 3), (std::vector<std::string>{"A", "", "F"}));
+    EXPECT_EQ(VariantToString(list->RowTag(1)), "2");
+    EXPECT_EQ(View(window).model()->rowCount(), 3) << "the view shows them";
+}
+
+TEST_F(ListPageTest, RowsStayWhenTheStoreIsEmptiedOrRemoved) {
+    Store({Result("1", "Box.ai"), Result("2", "Jar.ai")});
+    auto window = StartUp();
+    ASSERT_EQ(window->Listbox1()->ListCount(), 2);
+    window->Listbox1()->SetListIndex(1);
+
+    Store({});
+    window->MainTabs()->Press(0);
+    window->MainTabs()->Press(1);
+    EXPECT_EQ(window->Listbox1()->ListCount(), 2);
+    EXPECT_EQ(window->Listbox1()->ListIndex(), 1) << "not cleared, selection kept";
+
+    std::filesystem::remove(demo::StorePath(tree.Path()));
+    window->PagePanel1()->SetValue(1);
+    EXPECT_EQ(window->Listbox1()->ListCount(), 2);
+    WriteFile(demo::StorePath(tree.Path()), "not a database");
+    window->PagePanel1()->SetValue(1);
+    EXPECT_EQ(Column(window, 1), (std::vector<std::string>{"Box.ai", "Jar.ai"}));
+}
+
+TEST_F(ListPageTest, EveryArrivalOnTheListReloadsRowsStoredMeanwhile) {
+    Store({Result("1", "Box.ai")});
+    auto window = StartUp();
+    Store({Result("1", "Box.ai"), Result("2", "Jar.ai")});
+    window->MainTabs()->Press(0);
+    EXPECT_EQ(window->Listbox1()->ListCount(), 1) << "the installation page loads nothing";
+    window->MainTabs()->Press(1);
+    EXPECT_EQ(window->Listbox1()->ListCount(), 2);
+
+    Store({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin.ai")});
+    DoubleClickRow(window, 0);
+    ASSERT_EQ(window->PagePanel1()->Value(), 2);
+    EXPECT_EQ(window->Listbox1()->ListCount(), 2) << "the report page loads nothing";
+    window->PushButton2()->Push();
+    EXPECT_EQ(window->Listbox1()->ListCount(), 3);
+}
+
+TEST_F(ListPageTest, ATableWithoutIdStopsTheLoadAtTheFirstRowInSilence) {
+    Store({},
+          "create table results_store (datetime text, document text, grade text, results text)");
+    {
+        // The schema lacks id: write the two rows by hand.
+        sqlite3* db = nullptr;
+        sqlite3_open(demo::StorePath(tree.Path()).c_str(), &db);
+        sqlite3_exec(db,
+                     "insert into results_store values ('2018', 'Box.ai', 'B', 'Code reads 7');"
+                     "insert into results_store values ('2019', 'Jar.ai', 'C', 'Code reads 8')",
+                     nullptr, nullptr, nullptr);
+        sqlite3_close(db);
+    }
+    ::testing::internal::CaptureStderr();
+    auto window = StartUp();
+    EXPECT_EQ(::testing::internal::GetCapturedStderr().find("Exception"), std::string::npos)
+        << "caught in the handler";
+    auto list = window->Listbox1();
+    ASSERT_EQ(list->ListCount(), 1);
+    EXPECT_EQ(list->Cell(0, 3), "B") << "the row being filled keeps its cells";
+    EXPECT_EQ(VariantToString(list->RowTag(0)), "");
+    EXPECT_EQ(window->PagePanel1()->Value(), 1);
+}
+
+TEST_F(ListPageTest, AClickOnAHeadingSortsAndTheOrderHoldsAcrossReloads) {
+    Store({Result("1", "b.ai"), Result("2", "C.ai"), Result("3", "a.ai")});
+    auto window = StartUp();
+    auto& header = *View(window).header();
+    QTest::mouseClick(header.viewport(), Qt::LeftButton, {},
+                      QPoint(header.sectionViewportPosition(1) + 10, header.height() / 2));
+    ProcessEvents();
+    EXPECT_EQ(Column(window, 1), (std::vector<std::string>{"a.ai", "b.ai", "C.ai"}));
+    EXPECT_EQ(VariantToString(window->Listbox1()->RowTag(0)), "3") << "tags go with their rows";
+
+    window->Listbox1()->PressHeading(1);
+    ProcessEvents();
+    EXPECT_EQ(Column(window, 1), (std::vector<std::string>{"C.ai", "b.ai", "a.ai"}));
+
+    Store({Result("1", "b.ai"), Result("2", "C.ai"), Result("3", "a.ai"), Result("4", "d.ai")});
+    window->PushButton2()->Push();
+    ProcessEvents();
+    EXPECT_EQ(Column(window, 1), (std::vector<std::string>{"d.ai", "C.ai", "b.ai", "a.ai"}));
+    EXPECT_EQ(VariantToString(window->Listbox1()->RowTag(0)), "4");
+}
+
+class StripeTest : public WindowTest {
+  protected:
+    QImage ListImage(const Ref<class Window1>& window) {
+        ProcessEvents();
+        return View(window).viewport()->grab().toImage();
+    }
+    QRgb RowPixel(const QImage& image, int row) { return image.pixel(120, row * 25 + 12); }
+};
+
+TEST_F(StripeTest, LightRowsAreTintedAndWhiteInTurn) {
+    SetAppearanceForTesting(Appearance::Light);
+    Store({Result("1", ""), Result("2", ""), Result("3", "")});
+    auto window = StartUp();
+    const QImage image = ListImage(window);
+    EXPECT_EQ(RowPixel(image, 0), qRgb(237, 243, 254));
+    EXPECT_EQ(RowPixel(image, 1), qRgb(255, 255, 255));
+    EXPECT_EQ(RowPixel(image, 2), qRgb(237, 243, 254));
+}
+
+TEST_F(StripeTest, DarkRowsFollowTheDesktopAndTheSelectionStillShows) {
+    Store({Result("1", ""), Result("2", ""), Result("3", "")});
+    auto window = StartUp();
+    SetAppearanceForTesting(Appearance::Dark);
+    const Color fill = FillColor();
+    QImage image = ListImage(window);
+    EXPECT_EQ(RowPixel(image, 0), qRgb(22, 22, 22));
+    EXPECT_EQ(RowPixel(image, 1), qRgb(Red(fill), Green(fill), Blue(fill)));
+
+    window->Listbox1()->SetListIndex(2);
+    image = ListImage(window);
+    EXPECT_NE(RowPixel(image, 2), qRgb(22, 22, 22)) << "the selected row is marked";
+    SetAppearanceForTesting(Appearance::Light);
+    ProcessEvents();
+}
+
+}  // namespace

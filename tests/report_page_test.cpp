@@ -1,0 +1,112 @@
+// The report page on the real window: a double click reads the row again and fills the form.
+#include <sqlite3.h>
+
+#include "window_fixture.h"
+
+using namespace testsupport;
+
+namespace {
+
+const std::string kReport =
+    "Code is EAN 13\rCode reads 5012345678900\r\rSymbol Length 29.83 mm\rCode is Sized at 80 "
+    "%\rBWR Measured As 15 mic\rBar Deviance 6 mic\rAll bars within tolerance\rActual "
+    "Measurements = +- mic 0\r  Bar 1 330\r    Bar 2 660\r\rBar/Space Deviances = +- mic 0\rBar 1 "
+    "+4\rBar 2 -2\r";
+
+class ReportPageTest : public WindowTest {
+  protected:
+    std::vector<std::string> Values(const Ref<class Window1>& window) {
+        std::vector<std::string> values;
+        for (long long i = 0; i <= 8; ++i) {
+            values.push_back(window->Label6(i)->Text());
+        }
+        return values;
+    }
+};
+
+TEST_F(ReportPageTest, ADoubleClickFillsEveryValueAndBothPanes) {
+    Store({{"a", "2018-11-04 10:00", "Cereal Box Front.ai", "A", "Code reads 1"},
+           {"b", "2018-11-04 11:00", "Label 250ml Bottle.pdf", "C", kReport}});
+    auto window = StartUp();
+    DoubleClickRow(window, 1);
+    EXPECT_EQ(window->PagePanel1()->Value(), 2);
+    EXPECT_TRUE(window->MainTabs()->Items()[1]->Selected());
+    EXPECT_EQ(Values(window),
+              (std::vector<std::string>{" EAN 13", " 5012345678900", " 29.83 mm", " 80 %",
+                                        " 15 mic", " 6 mic", "All bars within tolerance",
+                                        "Label 250ml Bottle.pdf", "C"}));
+    EXPECT_EQ(window->TextArea1()->Text(), "    Bar 1 330\r    Bar 2 660");
+    EXPECT_EQ(window->TextArea2()->Text(), "    Bar 1 +4\rBar 2 -2");
+    EXPECT_TRUE(window->Label6(8)->Widget()->isVisible());
+}
+
+TEST_F(ReportPageTest, ATextThatFailsTheTestLeavesTheListAndTheOldReport) {
+    Store({{"a", "", "First.ai", "A", kReport},
+           {"b", "", "Second.ai", "B", "Verifier\rCode reads 99"}});
+    auto window = StartUp();
+    DoubleClickRow(window, 0);
+    ASSERT_EQ(window->PagePanel1()->Value(), 2);
+    const auto shown = Values(window);
+    window->PushButton2()->Push();
+
+    DoubleClickRow(window, 1);
+    EXPECT_EQ(window->PagePanel1()->Value(), 1);
+    EXPECT_EQ(Values(window), shown);
+    EXPECT_EQ(window->TextArea1()->Text(), "    Bar 1 330\r    Bar 2 660");
+}
+
+TEST_F(ReportPageTest, TheRowIsReadAfreshAndADeletedRowDoesNothing) {
+    Store({{"a", "", "First.ai", "A", kReport}});
+    auto window = StartUp();
+    Store({{"a", "", "First, second version.ai", "B", kReport}});
+    DoubleClickRow(window, 0);
+    EXPECT_EQ(window->Label6(7)->Text(), "First, second version.ai");
+    window->PushButton2()->Push();
+
+    Store({{"a", "", "Gone.ai", "B", kReport}});
+    ASSERT_EQ(window->Listbox1()->ListCount(), 1);
+    std::filesystem::remove(demo::StorePath(tree.Path()));
+    Store({{"z", "", "Other.ai", "B", kReport}});
+    DoubleClickRow(window, 0);
+    EXPECT_EQ(window->PagePanel1()->Value(), 1);
+    EXPECT_EQ(window->Label6(7)->Text(), "First, second version.ai");
+}
+
+TEST_F(ReportPageTest, AMissingMarkerLeavesItsValueEmptyAndABlocklessPaneFourBlanks) {
+    Store({{"q'uote", "", "Doc.ai", "A", "Code reads 7\rno type"},
+           {"n", "", "N.ai", "D", "Code is X"}});
+    auto window = StartUp();
+    DoubleClickRow(window, 0);
+    EXPECT_EQ(window->PagePanel1()->Value(), 1) << "a quote in the id ends the read in silence";
+
+    DoubleClickRow(window, 1);
+    ASSERT_EQ(window->PagePanel1()->Value(), 2);
+    EXPECT_EQ(window->Label6(0)->Text(), " X");
+    EXPECT_EQ(window->Label6(1)->Text(), "");
+    EXPECT_EQ(window->Label6(2)->Text(), "");
+    EXPECT_EQ(window->TextArea1()->Text(), "    ");
+    EXPECT_EQ(window->TextArea2()->Text(), "    ");
+}
+
+TEST_F(ReportPageTest, AMissingColumnRaisesOutOfTheHandlerAndThePageStays) {
+    Store({{"a", "", "Doc.ai", "A", kReport}});
+    auto window = StartUp();
+    // The same row in a table without the document column.
+    Store({}, "create table results_store (id text, results text)");
+    sqlite3* db = nullptr;
+    sqlite3_open(demo::StorePath(tree.Path()).c_str(), &db);
+    const std::string insert = "insert into results_store values ('a', '" + kReport + "')";
+    ASSERT_EQ(sqlite3_exec(db, insert.c_str(), nullptr, nullptr, nullptr), SQLITE_OK);
+    sqlite3_close(db);
+
+    ::testing::internal::CaptureStderr();
+    DoubleClickRow(window, 0);
+    const std::string printed = ::testing::internal::GetCapturedStderr();
+    EXPECT_NE(printed.find("NilObjectException"), std::string::npos) << printed;
+    EXPECT_EQ(window->PagePanel1()->Value(), 1);
+    EXPECT_EQ(window->Label6(7)->Text(), "Code Type");
+    window->MainTabs()->Press(0);
+    EXPECT_EQ(window->PagePanel1()->Value(), 0) << "the program goes on";
+}
+
+}  // namespace

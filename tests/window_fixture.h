@@ -1,0 +1,53 @@
+// A window started as at program start, over a temporary tree with a results store.
+#pragma once
+
+#include <QTest>
+#include <QTreeView>
+
+#include "scripts/demo_tree.h"
+#include "shell/startup.h"
+#include "shell/window1.h"
+#include "support.h"
+
+namespace testsupport {
+
+class WindowTest : public SlateTest {
+  protected:
+    // The start-up that the event loop would run, without the loop.
+    Ref<class Window1> StartUp() {
+        _EarlyStartup();
+        _LateStartup();
+        CurrentApplication()->Event_Open();
+        ProcessEvents();
+        return Window1();
+    }
+    void Store(const std::vector<demo::StoredResult>& rows,
+               const std::string& schema = demo::kSchema) {
+        std::filesystem::remove(demo::StorePath(tree.Path()));
+        demo::WriteStore(demo::StorePath(tree.Path()), rows, schema);
+    }
+    QTreeView& View(const Ref<class Window1>& window) {
+        return *static_cast<QTreeView*>(window->Listbox1()->Widget());
+    }
+    // A real double click on a row of the list.
+    void DoubleClickRow(const Ref<class Window1>& window, int row) {
+        QTreeView& view = View(window);
+        ProcessEvents();
+        const QRect rect = view.visualRect(view.model()->index(row, 1));
+        QTest::mouseClick(view.viewport(), Qt::LeftButton, {}, rect.center());
+        QTest::mouseDClick(view.viewport(), Qt::LeftButton, {}, rect.center());
+    }
+    std::vector<std::string> Column(const Ref<class Window1>& window, int column) {
+        std::vector<std::string> cells;
+        auto list = window->Listbox1();
+        for (long long row = 0; row < list->ListCount(); ++row) {
+            cells.push_back(list->Cell(row, column));
+        }
+        return cells;
+    }
+
+    TempDir tree;
+    ScopedRoot root{tree.Path()};
+};
+
+}  // namespace testsupport
