@@ -46,17 +46,27 @@ Ref<DatabaseField> RecordSet::Field(const std::string& name) const {
     if (!statement_ || atEnd_) {
         return nullptr;
     }
-    for (size_t i = 0; i < columns_.size(); ++i) {
-        if (TextEquals(columns_[i], name)) {
-            const auto column = static_cast<int>(i);
-            const auto* text =
-                reinterpret_cast<const char*>(sqlite3_column_text(statement_, column));
-            const int bytes = sqlite3_column_bytes(statement_, column);
-            return New<DatabaseField>(text ? std::string(text, static_cast<size_t>(bytes))
-                                           : std::string());
+    int column = -1;
+    for (const auto& [asked, found] : asked_) {
+        if (asked == name) {
+            column = found;
+            break;
         }
     }
-    return nullptr;
+    if (column < 0) {
+        for (size_t i = 0; i < columns_.size() && column < 0; ++i) {
+            if (TextEquals(columns_[i], name)) {
+                column = static_cast<int>(i);
+            }
+        }
+        if (column < 0) {
+            return nullptr;
+        }
+        asked_.emplace_back(name, column);
+    }
+    const auto* text = reinterpret_cast<const char*>(sqlite3_column_text(statement_, column));
+    const int bytes = sqlite3_column_bytes(statement_, column);
+    return New<DatabaseField>(text ? std::string(text, static_cast<size_t>(bytes)) : std::string());
 }
 
 // A failure while stepping ends the rows, as the end of the result would.

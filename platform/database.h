@@ -18,7 +18,7 @@ class DatabaseField {
     explicit DatabaseField(std::string value) : value_(std::move(value)) {}
     // The column's value as text; a NULL is the empty text.
     std::string StringValue() const { return value_; }
-    operator std::string() const { return value_; }
+    operator const std::string&() const { return value_; }
 
   private:
     std::string value_;
@@ -43,6 +43,8 @@ class RecordSet {
     sqlite3_stmt* statement_;
     bool atEnd_;
     std::vector<std::string> columns_;
+    // Names asked before, exactly as asked, with their column: a loop asks the same few.
+    mutable std::vector<std::pair<std::string, int>> asked_;
 };
 
 class SQLiteDatabase {

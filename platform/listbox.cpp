@@ -1,11 +1,12 @@
-// Listbox over QTreeView: fixed columns, a heading that sorts, and a delegate that lets the
+// Listbox over QTableView, which keeps no item per row: fixed columns, a heading that sorts,
+// and a delegate that lets the
 // CellBackgroundPaint event paint the ground of each cell before the list draws its text.
 #include "platform/listbox.h"
 
 #include <QHeaderView>
 #include <QPainter>
 #include <QStyledItemDelegate>
-#include <QTreeView>
+#include <QTableView>
 
 #include "platform/application.h"
 #include "platform/list_model.h"
@@ -68,34 +69,37 @@ std::vector<int> ParseWidths(const std::string& text) {
     return widths;
 }
 
-QTreeView& View(QWidget& widget) {
-    return static_cast<QTreeView&>(widget);
+QTableView& View(QWidget& widget) {
+    return static_cast<QTableView&>(widget);
 }
 
 }  // namespace
 
 Listbox::Listbox() : model_(std::make_unique<ListModel>()) {
-    auto* view = new QTreeView;
-    view->setRootIsDecorated(false);
-    view->setIndentation(0);
-    view->setUniformRowHeights(true);
-    view->setItemsExpandable(false);
-    view->setAllColumnsShowFocus(false);
+    auto* view = new QTableView;
+    view->setShowGrid(false);
+    view->setWordWrap(false);
+    view->setCornerButtonEnabled(false);
+    view->verticalHeader()->hide();
+    view->verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
+    view->verticalHeader()->setDefaultSectionSize(Rows().RowHeight());
+    view->horizontalHeader()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
+    view->horizontalHeader()->setHighlightSections(false);
     view->setSelectionMode(QAbstractItemView::SingleSelection);
     view->setSelectionBehavior(QAbstractItemView::SelectRows);
     view->setEditTriggers(QAbstractItemView::NoEditTriggers);
     view->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     view->setModel(model_.get());
     view->setItemDelegate(new CellDelegate(*this));
-    view->header()->setSectionsMovable(false);
-    view->header()->setSectionsClickable(true);
-    view->header()->setSortIndicatorShown(false);
-    view->header()->setStretchLastSection(false);
+    view->horizontalHeader()->setSectionsMovable(false);
+    view->horizontalHeader()->setSectionsClickable(true);
+    view->horizontalHeader()->setSortIndicatorShown(false);
+    view->horizontalHeader()->setStretchLastSection(false);
     SetWidget(view);
 
-    QObject::connect(view->header(), &QHeaderView::sectionClicked, view,
+    QObject::connect(view->horizontalHeader(), &QHeaderView::sectionClicked, view,
                      [this](int column) { PressHeading(column); });
-    QObject::connect(view, &QTreeView::doubleClicked, view, [this] {
+    QObject::connect(view, &QTableView::doubleClicked, view, [this] {
         if (DoubleClick) {
             RaiseEvent([this] { DoubleClick(*this); });
         }
@@ -110,7 +114,7 @@ Listbox::Listbox() : model_(std::make_unique<ListModel>()) {
 Listbox::~Listbox() = default;
 
 void Listbox::DetachWidget() {
-    if (auto* view = static_cast<QTreeView*>(Widget())) {
+    if (auto* view = static_cast<QTableView*>(Widget())) {
         static_cast<CellDelegate*>(view->itemDelegate())->Forget();
         // The model goes with the view, which may still be on its way out.
         model_.release()->setParent(view);
@@ -120,7 +124,7 @@ void Listbox::DetachWidget() {
 
 void Listbox::SetProperty(const std::string& name, const PropertyValue& value) {
     Control::SetProperty(name, value);
-    QTreeView& view = View(LiveWidget());
+    QTableView& view = View(LiveWidget());
     if (name == "ColumnCount" || name == "InitialValue") {
         QStringList headings = QString::fromStdString(StringProperty("InitialValue")).split('\t');
         const int count = static_cast<int>(IntegerProperty("ColumnCount"));
@@ -134,12 +138,13 @@ void Listbox::SetProperty(const std::string& name, const PropertyValue& value) {
             view.setColumnWidth(static_cast<int>(i), widths[i]);
         }
     } else if (name == "ColumnsResizable") {
-        view.header()->setSectionResizeMode(std::get<bool>(value) ? QHeaderView::Interactive
-                                                                  : QHeaderView::Fixed);
+        view.horizontalHeader()->setSectionResizeMode(
+            std::get<bool>(value) ? QHeaderView::Interactive : QHeaderView::Fixed);
     } else if (name == "HasHeading") {
-        view.setHeaderHidden(!std::get<bool>(value));
+        view.horizontalHeader()->setVisible(std::get<bool>(value));
     } else if (name == "DefaultRowHeight") {
         Rows().SetRowHeight(static_cast<int>(std::get<long long>(value)));
+        view.verticalHeader()->setDefaultSectionSize(Rows().RowHeight());
     } else if (name == "ScrollBarVertical") {
         view.setVerticalScrollBarPolicy(std::get<bool>(value) ? Qt::ScrollBarAsNeeded
                                                               : Qt::ScrollBarAlwaysOff);
@@ -198,7 +203,7 @@ long long Listbox::ListIndex() const {
 }
 
 void Listbox::SetListIndex(long long row) {
-    QTreeView& view = View(LiveWidget());
+    QTableView& view = View(LiveWidget());
     Rows().Flush();
     if (row < 0) {
         view.clearSelection();
@@ -217,9 +222,9 @@ void Listbox::PressHeading(long long column) {
     const Qt::SortOrder order = again && Rows().SortOrder() == Qt::AscendingOrder
                                     ? Qt::DescendingOrder
                                     : Qt::AscendingOrder;
-    QTreeView& view = View(LiveWidget());
-    view.header()->setSortIndicatorShown(true);
-    view.header()->setSortIndicator(static_cast<int>(column), order);
+    QTableView& view = View(LiveWidget());
+    view.horizontalHeader()->setSortIndicatorShown(true);
+    view.horizontalHeader()->setSortIndicator(static_cast<int>(column), order);
     Rows().sort(static_cast<int>(column), order);
 }
 

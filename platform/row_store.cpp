@@ -75,8 +75,12 @@ std::string_view RowStore::Field(size_t row, int field) const {
 }
 
 void RowStore::SetField(size_t row, int field, std::string_view text) {
+    if (rows_[row] == lastRecord_ && SetTailField(field, text)) {
+        return;
+    }
     const char* old = RecordAt(rows_[row]);
-    std::string record;
+    std::string& record = scratch_;
+    record.clear();
     for (int i = 0; i < fieldCount_; ++i) {
         const std::string_view value = i == field ? text : FieldOf(old, i);
         PutLength(record, value.size());
@@ -87,6 +91,38 @@ void RowStore::SetField(size_t row, int field, std::string_view text) {
         used_ = static_cast<size_t>(lastRecord_ & 0xFFFFFFFF);
     }
     rows_[row] = Append(record);
+}
+
+// Filling the last row from left to right: when every field behind `field` is still empty,
+// the record is cut at `field` and written on from there, without copying what stands ahead.
+bool RowStore::SetTailField(int field, std::string_view text) {
+    if (chunkSizes_.back() != kChunkSize) {
+        return false;
+    }
+    char* record = chunks_.back().get() + (lastRecord_ & 0xFFFFFFFF);
+    const char* at = record;
+    for (int i = 0; i < field; ++i) {
+        at += GetLength(at);
+    }
+    char* fieldStart = const_cast<char*>(at);
+    GetLength(at);  // the old value of the field itself may be anything
+    for (int i = field + 1; i < fieldCount_; ++i) {
+        if (*at++ != 0) {
+            return false;
+        }
+    }
+    std::string& tail = scratch_;
+    tail.clear();
+    PutLength(tail, text.size());
+    tail += text;
+    tail.append(static_cast<size_t>(fieldCount_ - field - 1), '\0');
+    const size_t start = static_cast<size_t>(fieldStart - chunks_.back().get());
+    if (start + tail.size() > kChunkSize) {
+        return false;
+    }
+    std::memcpy(fieldStart, tail.data(), tail.size());
+    used_ = start + tail.size();
+    return true;
 }
 
 void RowStore::Clear() {

@@ -31,6 +31,7 @@ class RowStore {
     static constexpr size_t kChunkSize = 1 << 20;
 
     uint64_t Append(std::string_view record);
+    bool SetTailField(int field, std::string_view text);
     const char* RecordAt(uint64_t location) const;
 
     int fieldCount_;
@@ -38,5 +39,6 @@ class RowStore {
     std::vector<size_t> chunkSizes_;
     size_t used_ = 0;  // bytes used in the last chunk
     std::vector<uint64_t> rows_;
+    std::string scratch_;  // the record being rebuilt, kept to spare an allocation per cell
     uint64_t lastRecord_ = UINT64_MAX;
 };

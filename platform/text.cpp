@@ -284,6 +284,17 @@ std::string Chr(long long code) {
 int RuntimeStringCompare(std::string_view first, std::string_view second) {
     size_t a = 0;
     size_t b = 0;
+    // ASCII on both sides, the common case, needs no decoding.
+    while (a < first.size() && b < second.size() &&
+           (static_cast<unsigned char>(first[a]) | static_cast<unsigned char>(second[b])) < 0x80) {
+        const char ca = FoldAscii(first[a]);
+        const char cb = FoldAscii(second[b]);
+        if (ca != cb) {
+            return ca < cb ? -1 : 1;
+        }
+        ++a;
+        ++b;
+    }
     while (a < first.size() && b < second.size()) {
         size_t lengthA = 0;
         size_t lengthB = 0;

@@ -98,9 +98,16 @@ void WriteStore(const fs::path& file, const std::vector<StoredResult>& rows,
     Check(sqlite3_open(file.c_str(), &raw), raw);
     std::unique_ptr<sqlite3, decltype(&sqlite3_close)> db(raw, sqlite3_close);
     Check(sqlite3_exec(raw, schema.c_str(), nullptr, nullptr, nullptr), raw);
-    if (rows.empty()) {
-        return;  // the table as it stands, whatever its columns
+    db.reset();
+    if (!rows.empty()) {
+        AppendToStore(file, rows);  // a table without these columns stays as it is
     }
+}
+
+void AppendToStore(const fs::path& file, const std::vector<StoredResult>& rows) {
+    sqlite3* raw = nullptr;
+    Check(sqlite3_open(file.c_str(), &raw), raw);
+    std::unique_ptr<sqlite3, decltype(&sqlite3_close)> db(raw, sqlite3_close);
     Check(sqlite3_exec(raw, "begin", nullptr, nullptr, nullptr), raw);
     sqlite3_stmt* insert = nullptr;
     Check(sqlite3_prepare_v2(raw,
@@ -125,6 +132,21 @@ void WriteStore(const fs::path& file, const std::vector<StoredResult>& rows,
     }
     sqlite3_finalize(insert);
     Check(sqlite3_exec(raw, "commit", nullptr, nullptr, nullptr), raw);
+}
+
+void WriteInventedStore(const fs::path& file, size_t count) {
+    constexpr size_t kBatch = 50000;
+    for (size_t done = 0; done < count; done += kBatch) {
+        std::vector<StoredResult> rows = InventedResults(std::min(kBatch, count - done), false);
+        for (size_t i = 0; i < rows.size(); ++i) {
+            rows[i].id = std::to_string(done + i + 1);
+        }
+        if (done == 0) {
+            WriteStore(file, rows);
+        } else {
+            AppendToStore(file, rows);
+        }
+    }
 }
 
 fs::path StorePath(const fs::path& root) {

@@ -37,6 +37,12 @@ inline constexpr const char* kSchema =
 void WriteStore(const std::filesystem::path& file, const std::vector<StoredResult>& rows,
                 const std::string& schema = kSchema);
 
+// Adds rows to the results_store table of an existing store.
+void AppendToStore(const std::filesystem::path& file, const std::vector<StoredResult>& rows);
+
+// Writes a store of `count` invented results without holding them all in memory.
+void WriteInventedStore(const std::filesystem::path& file, size_t count);
+
 // Where the program finds the store and the application data under a root.
 std::filesystem::path StorePath(const std::filesystem::path& root);
 std::filesystem::path ApplicationDataPath(const std::filesystem::path& root);

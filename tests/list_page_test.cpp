@@ -98,7 +98,7 @@ TEST_F(ListPageTest, ATableWithoutIdStopsTheLoadAtTheFirstRowInSilence) {
 TEST_F(ListPageTest, AClickOnAHeadingSortsAndTheOrderHoldsAcrossReloads) {
     Store({Result("1", "b.ai"), Result("2", "C.ai"), Result("3", "a.ai")});
     auto window = StartUp();
-    auto& header = *View(window).header();
+    auto& header = *View(window).horizontalHeader();
     QTest::mouseClick(header.viewport(), Qt::LeftButton, {},
                       QPoint(header.sectionViewportPosition(1) + 10, header.height() / 2));
     ProcessEvents();

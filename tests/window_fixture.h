@@ -2,7 +2,7 @@
 #pragma once
 
 #include <QTest>
-#include <QTreeView>
+#include <QTableView>
 
 #include "scripts/demo_tree.h"
 #include "shell/startup.h"
@@ -26,12 +26,12 @@ class WindowTest : public SlateTest {
         std::filesystem::remove(demo::StorePath(tree.Path()));
         demo::WriteStore(demo::StorePath(tree.Path()), rows, schema);
     }
-    QTreeView& View(const Ref<class Window1>& window) {
-        return *static_cast<QTreeView*>(window->Listbox1()->Widget());
+    QTableView& View(const Ref<class Window1>& window) {
+        return *static_cast<QTableView*>(window->Listbox1()->Widget());
     }
     // A real double click on a row of the list.
     void DoubleClickRow(const Ref<class Window1>& window, int row) {
-        QTreeView& view = View(window);
+        QTableView& view = View(window);
         ProcessEvents();
         const QRect rect = view.visualRect(view.model()->index(row, 1));
         QTest::mouseClick(view.viewport(), Qt::LeftButton, {}, rect.center());

@@ -1,0 +1,60 @@
+// CopyFileOrFolder on real trees.
+#include "window_fixture.h"
+
+using namespace testsupport;
+namespace fs = std::filesystem;
+
+namespace {
+
+class CopyTest : public WindowTest {
+  protected:
+    Ref<FolderItem> Item(const fs::path& path) { return GetFolderItem(path.string(), 3); }
+    fs::path src = tree.Path() / "src";
+    fs::path dst = tree.Path() / "dst";
+};
+
+TEST_F(CopyTest, AFileGoesIntoTheFolderUnderItsOwnName) {
+    WriteFile(src / "Quilbrant.aip", "binary");
+    fs::create_directories(dst);
+    _EarlyStartup();
+    Window1()->CopyFileOrFolder(Item(src / "Quilbrant.aip"), Item(dst));
+    EXPECT_EQ(ReadFile(dst / "Quilbrant.aip"), "binary");
+}
+
+TEST_F(CopyTest, AFolderGoesWholeWithEmptyFoldersAndDotFiles) {
+    WriteFile(src / "P.plugin/Contents/Info.plist", "plist");
+    WriteFile(src / "P.plugin/.hidden", "dot");
+    WriteFile(src / "P.plugin/Contents/a/b/c/deep.txt", "deep");
+    fs::create_directories(src / "P.plugin/Contents/empty");
+    fs::create_directories(dst);
+    _EarlyStartup();
+    Window1()->CopyFileOrFolder(Item(src / "P.plugin"), Item(dst));
+    EXPECT_EQ(ReadFile(dst / "P.plugin/Contents/Info.plist"), "plist");
+    EXPECT_EQ(ReadFile(dst / "P.plugin/.hidden"), "dot");
+    EXPECT_EQ(ReadFile(dst / "P.plugin/Contents/a/b/c/deep.txt"), "deep");
+    EXPECT_TRUE(fs::is_directory(dst / "P.plugin/Contents/empty"));
+}
+
+TEST_F(CopyTest, NilArgumentsRaise) {
+    WriteFile(src / "P.plugin/x", "x");
+    _EarlyStartup();
+    auto window = Window1();
+    EXPECT_THROW(window->CopyFileOrFolder(nullptr, Item(dst)), NilObjectException);
+    EXPECT_THROW(window->CopyFileOrFolder(Item(src / "P.plugin"), nullptr), NilObjectException);
+    EXPECT_FALSE(fs::exists(dst));
+}
+
+TEST_F(CopyTest, ALinkLoopRaisesStackOverflowAndLeavesWhatWasCopied) {
+    WriteFile(src / "P.plugin/a.txt", "a");
+    fs::create_directory_symlink(".", src / "P.plugin/loop");
+    fs::create_directories(dst);
+    _EarlyStartup();
+    EXPECT_THROW(Window1()->CopyFileOrFolder(Item(src / "P.plugin"), Item(dst)),
+                 StackOverflowException);
+    EXPECT_EQ(ReadFile(dst / "P.plugin/a.txt"), "a");
+    EXPECT_TRUE(fs::exists(dst / "P.plugin/loop/loop/a.txt"));
+    // The depth counter is back at zero: a plain copy works afterwards.
+    Window1()->CopyFileOrFolder(Item(src / "P.plugin/a.txt"), Item(dst));
+}
+
+}  // namespace

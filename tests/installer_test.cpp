@@ -1,0 +1,285 @@
+// "Install Now" on the real window, one press per row of the decision table, reading the
+// message that was shown and the files that stand afterwards.
+#include <unistd.h>
+
+#include "installer/plugin_folders.h"
+#include "window_fixture.h"
+
+using namespace testsupport;
+namespace fs = std::filesystem;
+
+namespace {
+
+enum Row {
+    kPrompt = 0,
+    kAcrobatX = 1,
+    kAcrobatXI = 2,
+    kAcrobat2017 = 3,
+    kAcrobatDC = 4,
+    kDivider = 5,
+    kIllustrator = 6
+};
+
+class InstallerTest : public WindowTest {
+  protected:
+    void SetUp() override {
+        SetResourcesFolderForTesting(resources);
+        MakePlugin(resources / "Quilbrant.aip");
+        MakePlugin(resources / "Ostrelin.acroplugin");
+    }
+    void TearDown() override {
+        SetResourcesFolderForTesting({});
+        WindowTest::TearDown();
+    }
+    static void MakePlugin(const fs::path& bundle) {
+        WriteFile(bundle / "Contents/Info.plist", "<plist/>");
+        WriteFile(bundle / "Contents/MacOS/binary", std::string(4096, 'x'));
+        WriteFile(bundle / "Contents/.signature", "sig");
+        fs::create_directories(bundle / "Contents/Resources/empty");
+    }
+    fs::path Data() const { return demo::ApplicationDataPath(tree.Path()); }
+    fs::path Illustrator(const std::string& version) const {
+        return Data() / "Adobe" / ("Adobe Illustrator " + version);
+    }
+    // Selects the row and presses "Install Now"; returns the one message shown.
+    std::string Press(Row row) {
+        auto window = Window1();
+        window->MainTabs()->Press(0);
+        window->PopupMenu1()->SetListIndex(row);
+        MessageLog log;
+        window->PushButton1()->Push();
+        EXPECT_EQ(window->PopupMenu1()->ListIndex(), row) << "the popup keeps its choice";
+        EXPECT_LE(log.messages.size(), 1u);
+        return log.messages.empty() ? std::string() : log.messages.front();
+    }
+    bool Installed(const fs::path& folder, const char* plugin) const {
+        return fs::exists(folder / plugin / "Contents/MacOS/binary") &&
+               fs::exists(folder / plugin / "Contents/.signature") &&
+               fs::is_directory(folder / plugin / "Contents/Resources/empty");
+    }
+
+    fs::path resources = tree.Path() / "app resources";
+};
+
+TEST_F(InstallerTest, ThePromptRowAsksForAProductAndTouchesNothing) {
+    fs::remove_all(resources);
+    StartUp();
+    EXPECT_EQ(Press(kPrompt), "Choose which version of Acrobat you are using");
+    EXPECT_FALSE(fs::exists(Data()));
+}
+
+TEST_F(InstallerTest, IllustratorInstallsIntoTheHighestNumberedFolder) {
+    fs::create_directories(Illustrator("22") / "en_US/Plug-ins");
+    fs::create_directories(Illustrator("23") / "en_US/Plug-ins");
+    WriteFile(Illustrator("23") / ".DS_Store", "");
+    StartUp();
+    EXPECT_EQ(Press(kIllustrator), "Installed please restart Illustrator");
+    EXPECT_TRUE(Installed(Illustrator("23") / "en_US/Plug-ins", "Quilbrant.aip"));
+    EXPECT_FALSE(fs::exists(Illustrator("22") / "en_US/Plug-ins/Quilbrant.aip"));
+
+    // A second install over the first installs again.
+    WriteFile(resources / "Quilbrant.aip/Contents/MacOS/binary", "version 2");
+    EXPECT_EQ(Press(kIllustrator), "Installed please restart Illustrator");
+    EXPECT_EQ(ReadFile(Illustrator("23") / "en_US/Plug-ins/Quilbrant.aip/Contents/MacOS/binary"),
+              "version 2");
+}
+
+struct WalkStop {
+    const char* name;
+    void (*make)(const fs::path& adobe);
+};
+
+class WalkStopTest : public InstallerTest, public ::testing::WithParamInterface<WalkStop> {};
+
+// Every stop of the walk tells the user, even with the plug-in missing from the resources.
+TEST_P(WalkStopTest, TellsTheUserAndCopiesNothing) {
+    const fs::path adobe = Data() / "Adobe";
+    fs::create_directories(Data());
+    GetParam().make(adobe);
+    fs::remove_all(resources / "Quilbrant.aip");
+    StartUp();
+    EXPECT_EQ(Press(kIllustrator), "Could not find Illustrator plugins folder.");
+    for (const auto& entry : fs::recursive_directory_iterator(Data())) {
+        EXPECT_NE(entry.path().filename(), "Quilbrant.aip");
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Stops, WalkStopTest,
+    ::testing::Values(
+        WalkStop{"NoAdobeFolder", [](const fs::path&) {}},
+        WalkStop{"AdobeIsAFile", [](const fs::path& a) { WriteFile(a, "file"); }},
+        WalkStop{"NoIllustratorFolder",
+                 [](const fs::path& a) { fs::create_directories(a / "Acrobat"); }},
+        WalkStop{"OnlyNegativeNumbers",
+                 [](const fs::path& a) { fs::create_directories(a / "Adobe Illustrator -1"); }},
+        WalkStop{"NumberedFolderMissing",
+                 [](const fs::path& a) {
+                     fs::create_directories(a / "Adobe Illustrator 22.9/x/Plug-ins");
+                 }},
+        WalkStop{"NumberedFolderEmpty",
+                 [](const fs::path& a) { fs::create_directories(a / "Adobe Illustrator 24"); }},
+        WalkStop{
+            "NoPlugInsFolder",
+            [](const fs::path& a) { fs::create_directories(a / "Adobe Illustrator 24/en_US"); }},
+        WalkStop{
+            "PlugInsIsAFile",
+            [](const fs::path& a) { WriteFile(a / "Adobe Illustrator 24/en_US/Plug-ins", ""); }}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+TEST_F(InstallerTest, AcrobatDcAnd2017InstallUnderApplicationData) {
+    fs::create_directories(Data() / "Adobe/Acrobat/DC/Plug-ins");
+    fs::create_directories(Data() / "Adobe/Acrobat/2017/Plug-ins");
+    StartUp();
+    EXPECT_EQ(Press(kAcrobatDC), "Installed please restart Acrobat");
+    EXPECT_TRUE(Installed(Data() / "Adobe/Acrobat/DC/Plug-ins", "Ostrelin.acroplugin"));
+    EXPECT_EQ(Press(kAcrobat2017), "Installed please restart Acrobat");
+    EXPECT_TRUE(Installed(Data() / "Adobe/Acrobat/2017/Plug-ins", "Ostrelin.acroplugin"));
+}
+
+TEST_F(InstallerTest, AcrobatXAndXIAreToldApartAndLieUnderApplications) {
+    const fs::path xi =
+        tree.Path() / "Applications/Adobe Acrobat XI Pro/Adobe Acrobat Pro.app/Contents/Plug-ins";
+    fs::create_directories(xi);
+    StartUp();
+    EXPECT_EQ(Press(kAcrobatX),
+              "There was an error copying the plugin please check you have access");
+    EXPECT_FALSE(fs::exists(tree.Path() / "Applications/Adobe Acrobat X Pro"))
+        << "the target folder is never created";
+    EXPECT_EQ(Press(kAcrobatXI), "Installed please restart Acrobat");
+    EXPECT_TRUE(Installed(xi, "Ostrelin.acroplugin"));
+}
+
+TEST_F(InstallerTest, AMissingSourceIsToldOnceTheTargetIsSettled) {
+    fs::remove_all(resources / "Ostrelin.acroplugin");
+    fs::remove_all(resources / "Quilbrant.aip");
+    fs::create_directories(Illustrator("26") / "en_US/Plug-ins");
+    StartUp();
+    EXPECT_EQ(Press(kAcrobatX), "Unable to install at this time") << "whatever the target";
+    EXPECT_EQ(Press(kDivider), "Unable to install at this time");
+    EXPECT_EQ(Press(kIllustrator), "Unable to install at this time");
+}
+
+TEST_F(InstallerTest, TheDividerRowRaisesOnItsNilTarget) {
+    StartUp();
+    EXPECT_EQ(Press(kDivider), "Unable to install at this time 1");
+}
+
+TEST_F(InstallerTest, ACopyThatLeavesNoPluginIsToldAndWhatWasCopiedStays) {
+    // A file stands where the plug-in's folder must go: the copy returns without a plug-in.
+    WriteFile(Data() / "Adobe/Acrobat/DC/Plug-ins", "not a folder");
+    StartUp();
+    EXPECT_EQ(Press(kAcrobatDC),
+              "There was an error copying the plugin please check you have access");
+}
+
+TEST_F(InstallerTest, ALinkBackUpTheTreeEndsInTheCatchAllWithoutACrash) {
+    fs::create_directories(Data() / "Adobe/Acrobat/DC/Plug-ins");
+    fs::create_directory_symlink("..", resources / "Ostrelin.acroplugin/Contents/loop");
+    StartUp();
+    EXPECT_EQ(Press(kAcrobatDC), "Unable to install at this time 1");
+    const fs::path copied = Data() / "Adobe/Acrobat/DC/Plug-ins/Ostrelin.acroplugin/Contents";
+    EXPECT_TRUE(fs::exists(copied / ".signature")) << "items copied before the loop stay";
+    EXPECT_TRUE(fs::exists(copied / "Info.plist"));
+    EXPECT_EQ(Window1()->PagePanel1()->Value(), 0) << "the program goes on";
+}
+
+// The walk by itself, on the names that it meets.
+struct WalkCase {
+    const char* name;
+    std::vector<std::string>
+        folders;           // below Adobe; each gets en_US/Plug-ins unless it ends in "/"
+    std::string expected;  // the plug-ins folder below Adobe, or "" for a stop
+};
+
+class WalkTest : public ::testing::TestWithParam<WalkCase> {
+  protected:
+    TempDir tree;
+    ScopedRoot root{tree.Path()};
+};
+
+TEST_P(WalkTest, FindsTheHighestNumberedFolder) {
+    const fs::path data = demo::ApplicationDataPath(tree.Path());
+    for (const std::string& folder : GetParam().folders) {
+        if (folder.back() == '/') {
+            fs::create_directories(data / "Adobe" / folder);
+        } else {
+            fs::create_directories(data / "Adobe" / folder / "en_US/Plug-ins");
+        }
+    }
+    MessageLog log;
+    Ref<FolderItem> target = IllustratorPluginsFolder(SpecialFolder::ApplicationData());
+    if (GetParam().expected.empty()) {
+        EXPECT_TRUE(target.IsNil());
+        EXPECT_EQ(log.messages,
+                  std::vector<std::string>{"Could not find Illustrator plugins folder."});
+    } else {
+        ASSERT_FALSE(target.IsNil());
+        EXPECT_EQ(target->NativePath(), data / "Adobe" / GetParam().expected);
+        EXPECT_TRUE(log.messages.empty());
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Names, WalkTest,
+    ::testing::Values(
+        WalkCase{"TwentyThreeBeatsTwentyTwo",
+                 {"Adobe Illustrator 23", "Adobe Illustrator 22"},
+                 "Adobe Illustrator 23/en_US/Plug-ins"},
+        WalkCase{"TwentyTwoNineIsTwentyTwo",
+                 {"Adobe Illustrator 22.9", "Adobe Illustrator 22"},
+                 "Adobe Illustrator 22/en_US/Plug-ins"},
+        WalkCase{"TwentyTwoNineAloneStops", {"Adobe Illustrator 22.9"}, ""},
+        WalkCase{"LeadingZeroIsDropped", {"Adobe Illustrator 022"}, ""},
+        WalkCase{"LeadingZeroFindsTheFolderWithout",
+                 {"Adobe Illustrator 022", "Adobe Illustrator 22"},
+                 "Adobe Illustrator 22/en_US/Plug-ins"},
+        WalkCase{"WordBeforeTheNumber",
+                 {"Adobe Illustrator CC 2018", "Adobe Illustrator 2018"},
+                 "Adobe Illustrator 2018/en_US/Plug-ins"},
+        WalkCase{"SearchTextInTheMiddle",
+                 {"Old Adobe Illustrator 30", "Adobe Illustrator 29", "Adobe Illustrator 30"},
+                 "Adobe Illustrator 30/en_US/Plug-ins"},
+        WalkCase{"LastFieldNoNumberGivesZero",
+                 {"Adobe Illustrator Settings", "Adobe Illustrator 0"},
+                 "Adobe Illustrator 0/en_US/Plug-ins"},
+        WalkCase{"NegativeNumbersDoNotCount", {"Adobe Illustrator -5", "Adobe Illustrator -1"}, ""},
+        WalkCase{"NoBlankBehindDoesNotCount", {"Adobe Illustrator"}, ""},
+        WalkCase{"CaseIsIgnored",
+                 {"adobe illustrator 24", "Adobe Illustrator 24"},
+                 "Adobe Illustrator 24/en_US/Plug-ins"},
+        WalkCase{"DotFilesBeforeTheSubFolder",
+                 {"Adobe Illustrator 25/.hidden/", "Adobe Illustrator 25/.config/Plug-ins/",
+                  "Adobe Illustrator 25"},
+                 "Adobe Illustrator 25/en_US/Plug-ins"},
+        WalkCase{"OnlyDotFilesMeansPlugInsIsSoughtInTheNumberedFolder",
+                 {"Adobe Illustrator 26/.hidden/"},
+                 ""},
+        WalkCase{
+            "PlugInsDirectlyInsideIsTakenForTheSubFolder", {"Adobe Illustrator 26/Plug-ins/"}, ""},
+        WalkCase{"TheFirstOfTwoSubFoldersIsTaken",
+                 {"Adobe Illustrator 27/a_first/", "Adobe Illustrator 27/b_second/Plug-ins/"},
+                 ""}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+TEST(AcrobatFolders, ThePathTable) {
+    TempDir tree;
+    ScopedRoot root{tree.Path()};
+    fs::create_directories(tree.Path() / "Users/user/Library/Application Support");
+    Ref<FolderItem> data = SpecialFolder::ApplicationData();
+    EXPECT_EQ(
+        AcrobatPluginsFolder("Acrobat X", data)->NativePath(),
+        tree.Path() / "Applications/Adobe Acrobat X Pro/Adobe Acrobat Pro.app/Contents/Plug-ins");
+    EXPECT_EQ(
+        AcrobatPluginsFolder("Acrobat XI", data)->NativePath(),
+        tree.Path() / "Applications/Adobe Acrobat XI Pro/Adobe Acrobat Pro.app/Contents/Plug-ins");
+    EXPECT_EQ(AcrobatPluginsFolder("Acrobat 2017", data)->NativePath(),
+              tree.Path() / "Users/user/Library/Application Support/Adobe/Acrobat/2017/Plug-ins");
+    EXPECT_EQ(AcrobatPluginsFolder("Acrobat DC", data)->NativePath(),
+              tree.Path() / "Users/user/Library/Application Support/Adobe/Acrobat/DC/Plug-ins");
+    EXPECT_TRUE(AcrobatPluginsFolder("-", data).IsNil());
+    EXPECT_TRUE(AcrobatPluginsFolder("Acrobat", nullptr).IsNil());
+    EXPECT_THROW(AcrobatPluginsFolder("Acrobat DC", nullptr), NilObjectException);
+}
+
+}  // namespace
