@@ -14,7 +14,10 @@ void MsgBox(const std::string& text) {
         testHandler(text);
         return;
     }
-    QMessageBox box(QApplication::activeWindow());
+    QWidget* parent = QApplication::activeWindow();
+    QMessageBox box(parent);
+    // The program's window title rather than the executable's name.
+    box.setWindowTitle(parent ? parent->windowTitle() : QString());
     box.setText(QString::fromStdString(text));
     box.setStandardButtons(QMessageBox::Ok);
     box.exec();
