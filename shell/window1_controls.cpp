@@ -268,6 +268,16 @@ std::string PropertiesOf(const ControlRow& row) {
     return block.Bytes();
 }
 
+// One row: allocate, enter under its name, look it up again and give it its properties.
+Ref<Control> CreateRow(class Window1& window, const ControlRow& row) {
+    window._AddControl(Make(row.kind, row.index), row.name);
+    Ref<Control> control = row.index == Control::kNoIndex
+                               ? window._ControlByName(row.name)
+                               : window._ControlByNameIndex(row.name, row.index);
+    _SetProperties(*control, PropertiesOf(row));
+    return control;
+}
+
 }  // namespace
 
 void Window1::CreateControls() {
@@ -275,34 +285,21 @@ void Window1::CreateControls() {
     _CreateControls1();
 }
 
-// Rows 1 to 30. Properties go on before handlers, so that PagePanel1's Value 0 raises no Change.
+// Rows 1 to 30. Handlers are bound after the properties, so that PagePanel1's Value 0 raises
+// no Change.
 void Window1::_CreateControls0() {
     const auto& table = ControlTable();
     for (size_t i = 0; i < 30; ++i) {
-        const ControlRow& row = table[i];
-        _AddControl(Make(row.kind, row.index), row.name);
-        Ref<Control> control = row.index == Control::kNoIndex
-                                   ? _ControlByName(row.name)
-                                   : _ControlByNameIndex(row.name, row.index);
-        _SetProperties(*control, PropertiesOf(row));
-        BindHandlers(*control);
+        BindHandlers(*CreateRow(*this, table[i]));
     }
 }
 
-// Rows 31 to 33; MainTabs gets its segments last.
+// Rows 31 to 33; MainTabs gets its segments before its handler.
 void Window1::_CreateControls1() {
     const auto& table = ControlTable();
-    for (size_t i = 30; i < table.size(); ++i) {
-        const ControlRow& row = table[i];
-        _AddControl(Make(row.kind, row.index), row.name);
-        Ref<Control> control = row.index == Control::kNoIndex
-                                   ? _ControlByName(row.name)
-                                   : _ControlByNameIndex(row.name, row.index);
-        _SetProperties(*control, PropertiesOf(row));
-        if (row.kind != Kind::SegmentedControl) {
-            BindHandlers(*control);
-        }
-    }
+    BindHandlers(*CreateRow(*this, table[30]));
+    BindHandlers(*CreateRow(*this, table[31]));
+    CreateRow(*this, table[32]);
     Ref<SegmentedControl> tabs = MainTabs();
     auto installation = New<SegmentedControlItem>();
     installation->SetTitle("Installation");

@@ -18,6 +18,13 @@ class StoreTest : public ::testing::Test {
                const std::string& schema = demo::kSchema) {
         demo::WriteStore(store, rows, schema);
     }
+    // Runs SQL on the store as the plug-in would, with its own connection.
+    void Exec(const std::string& sql) {
+        sqlite3* writer = nullptr;
+        sqlite3_open(store.c_str(), &writer);
+        ASSERT_EQ(sqlite3_exec(writer, sql.c_str(), nullptr, nullptr, nullptr), SQLITE_OK);
+        sqlite3_close(writer);
+    }
     int Rows(const std::string& statement) {
         SQLiteDatabase db;
         auto rows = OpenStore(db, statement);
@@ -103,11 +110,7 @@ TEST_F(StoreTest, ReadsEveryRowAsTextAndNullAsEmptyText) {
 
 TEST_F(StoreTest, NumbersAndBlobsReadAsText) {
     Write({}, "create table results_store (id integer primary key, datetime real, results blob)");
-    sqlite3* writer = nullptr;
-    sqlite3_open(store.c_str(), &writer);
-    sqlite3_exec(writer, "insert into results_store values (12, 2.5, x'436f6465')", nullptr,
-                 nullptr, nullptr);
-    sqlite3_close(writer);
+    Exec("insert into results_store values (12, 2.5, x'436f6465')");
     SQLiteDatabase db;
     auto rows = OpenStore(db, RowQuery("12"));
     ASSERT_FALSE(rows.IsNil());
@@ -118,11 +121,7 @@ TEST_F(StoreTest, NumbersAndBlobsReadAsText) {
 
 TEST_F(StoreTest, ATableWithoutIdGivesNilForThatField) {
     Write({}, "create table results_store (datetime text, results text)");
-    sqlite3* writer = nullptr;
-    sqlite3_open(store.c_str(), &writer);
-    sqlite3_exec(writer, "insert into results_store values ('2018', 'Code reads 1')", nullptr,
-                 nullptr, nullptr);
-    sqlite3_close(writer);
+    Exec("insert into results_store values ('2018', 'Code reads 1')");
     SQLiteDatabase db;
     auto rows = OpenStore(db, kListQuery);
     ASSERT_FALSE(rows.IsNil());
