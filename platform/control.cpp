@@ -10,6 +10,8 @@
 
 #include "platform/window.h"
 
+Control::Control() : context_(std::make_unique<QObject>()) {}
+
 Control::~Control() {
     if (widget_ && !widgetAdopted_) {
         delete widget_;

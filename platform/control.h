@@ -8,6 +8,7 @@
 #include "platform/property_block.h"
 #include "platform/ref.h"
 
+class QObject;
 class QWidget;
 class Window;
 
@@ -15,7 +16,7 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
   public:
     static constexpr long long kNoIndex = -2147483648LL;
 
-    Control() = default;
+    Control();
     ~Control() override;
 
     void SetProperty(const std::string& name, const PropertyValue& value) override;
@@ -42,6 +43,8 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
 
     // Platform use: the widget, and the window's hand-over when the control is entered.
     QWidget* Widget() const { return widget_; }
+    // The context of the control's signal connections: they end when the control does.
+    QObject* Context() const { return context_.get(); }
     void AttachTo(const std::shared_ptr<::Window>& window);
     virtual void DetachWidget() { widget_ = nullptr; }
 
@@ -63,6 +66,7 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     std::weak_ptr<::Window> window_;
     QWidget* widget_ = nullptr;
     bool widgetAdopted_ = false;
+    std::unique_ptr<QObject> context_;
 
     friend class Window;
     Ref<Control> Parent() const;

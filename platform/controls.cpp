@@ -61,7 +61,7 @@ void PagePanel::SetValue(long long value) {
 PushButton::PushButton() {
     auto* button = new QPushButton;
     SetWidget(button);
-    QObject::connect(button, &QPushButton::clicked, button, [this] {
+    QObject::connect(button, &QPushButton::clicked, Context(), [this] {
         if (Action) {
             RaiseEvent([this] { Action(*this); });
         }
@@ -207,7 +207,7 @@ void TextArea::SetText(const std::string& text) {
 TabPanel::TabPanel() {
     auto* tabs = new QTabWidget;
     SetWidget(tabs);
-    QObject::connect(tabs, &QTabWidget::currentChanged, tabs, [this] {
+    QObject::connect(tabs, &QTabWidget::currentChanged, Context(), [this] {
         if (auto window = Window()) {
             window->UpdateVisibility();
         }

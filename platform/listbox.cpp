@@ -97,18 +97,19 @@ Listbox::Listbox() : model_(std::make_unique<ListModel>()) {
     view->horizontalHeader()->setStretchLastSection(false);
     SetWidget(view);
 
-    QObject::connect(view->horizontalHeader(), &QHeaderView::sectionClicked, view,
+    QObject::connect(view->horizontalHeader(), &QHeaderView::sectionClicked, Context(),
                      [this](int column) { PressHeading(column); });
-    QObject::connect(view, &QTableView::doubleClicked, view, [this] {
+    QObject::connect(view, &QTableView::doubleClicked, Context(), [this] {
         if (DoubleClick) {
             RaiseEvent([this] { DoubleClick(*this); });
         }
     });
-    QObject::connect(view->selectionModel(), &QItemSelectionModel::selectionChanged, view, [this] {
-        if (Change) {
-            RaiseEvent([this] { Change(*this); });
-        }
-    });
+    QObject::connect(view->selectionModel(), &QItemSelectionModel::selectionChanged, Context(),
+                     [this] {
+                         if (Change) {
+                             RaiseEvent([this] { Change(*this); });
+                         }
+                     });
 }
 
 Listbox::~Listbox() = default;

@@ -91,7 +91,7 @@ void SegmentedControl::Rebuild() {
         button->setGeometry(x, 0, static_cast<int>(items_[i]->width_), Height());
         button->show();
         x += static_cast<int>(items_[i]->width_);
-        QObject::connect(button, &QPushButton::clicked, button,
+        QObject::connect(button, &QPushButton::clicked, Context(),
                          [this, index = static_cast<int>(i)] { Clicked(index); });
     }
     ShowSelection();

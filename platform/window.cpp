@@ -28,10 +28,6 @@ Window::Window(std::string className) : className_(std::move(className)) {}
 
 Window::~Window() {
     for (auto& control : controls_) {
-        if (QWidget* widget = control->Widget()) {
-            // No event of a widget on its way out may reach a handler.
-            QObject::disconnect(widget, nullptr, nullptr, nullptr);
-        }
         control->DetachWidget();
     }
     if (native_) {
