@@ -12,5 +12,6 @@ echo "Demo tree: $root"
 if [ -n "${DISPLAY:-}${WAYLAND_DISPLAY:-}" ]; then
   ORBELANE_ROOT="$root" build/orbelane-verification-storage
 else
+  echo "No display here: the program runs under Xvfb, unseen. Stop it with Ctrl+C."
   ORBELANE_ROOT="$root" xvfb-run -a build/orbelane-verification-storage
 fi
