@@ -36,7 +36,11 @@ bool IsContinuation(unsigned char byte) {
 // itself, mapped to a code point that no valid character folds to.
 char32_t DecodeAt(std::string_view text, size_t at, size_t& length) {
     const auto lead = static_cast<unsigned char>(text[at]);
-    int extra = lead >= 0xF0 && lead < 0xF5 ? 3 : lead >= 0xE0 ? 2 : lead >= 0xC2 ? 1 : 0;
+    const int extra = lead >= 0xF5   ? 0  // no character starts with these bytes
+                      : lead >= 0xF0 ? 3
+                      : lead >= 0xE0 ? 2
+                      : lead >= 0xC2 ? 1
+                                     : 0;
     if (lead < 0x80) {
         length = 1;
         return lead;

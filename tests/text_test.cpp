@@ -103,6 +103,9 @@ TEST(Text, StrChrAndComparison) {
     EXPECT_FALSE(TextEquals("Acrobat XI", "Acrobat X"));
     EXPECT_NE(RuntimeStringCompare("a", ""), 0);
     EXPECT_TRUE(TextEquals("\xC3\x89", "\xC3\xA9")) << "folding beyond ASCII";
+    EXPECT_FALSE(TextEquals("\xF8\x80\x80", "\xE8\x80\x80"))
+        << "invalid bytes stand for themselves";
+    EXPECT_FALSE(TextEquals("\xFF\xBF", "\xDF\xBF"));
     EXPECT_EQ(RuntimeAddString("Adobe Illustrator ", "22"), "Adobe Illustrator 22");
 }
 
