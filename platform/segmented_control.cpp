@@ -59,10 +59,6 @@ SegmentedControl::SegmentedControl() {
     SetWidget(row);
 }
 
-void SegmentedControl::SetProperty(const std::string& name, const PropertyValue& value) {
-    Control::SetProperty(name, value);
-}
-
 void SegmentedControl::SizeToFit() {
     long long width = 0;
     for (const auto& item : items_) {

@@ -42,7 +42,6 @@ class SegmentedControl : public Control {
     };
 
     SegmentedControl();
-    void SetProperty(const std::string& name, const PropertyValue& value) override;
     ItemList Items() { return ItemList(*this); }
     void SizeToFit();
     // As a click of the user on that segment.
