@@ -82,9 +82,10 @@ int main(int argc, char** argv) {
     }
     const double o = Median(ours);
     const double c = Median(cp);
-    std::printf("copy of %d files, %zu MB, median of %d: CopyFileOrFolder %.0f ms, cp -r %.0f ms, "
-                "ratio %.2f (target <= 1.2)\n",
-                kFiles, kFiles * kFileBytes / (1024 * 1024), runs, o, c, o / c);
+    std::printf(
+        "copy of %d files, %zu MB, median of %d: CopyFileOrFolder %.0f ms, cp -r %.0f ms, "
+        "ratio %.2f (target <= 1.2)\n",
+        kFiles, kFiles * kFileBytes / (1024 * 1024), runs, o, c, o / c);
     fs::remove_all(work);
     std::fflush(stdout);
     std::_Exit(0);

@@ -1,8 +1,8 @@
 // A window started as at program start, over a temporary tree with a results store.
 #pragma once
 
-#include <QTest>
 #include <QTableView>
+#include <QTest>
 
 #include "scripts/demo_tree.h"
 #include "shell/startup.h"
