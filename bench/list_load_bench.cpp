@@ -53,8 +53,6 @@ int MeasureOneLoad(int argc, char** argv, const char* root) {
     timer.start();
     window->PagePanel1()->SetValue(1);
     const double load = timer.nsecsElapsed() / 1e6;
-    const long loadPeak = StatusKilobytes("VmHWM") - baseline;
-    std::fprintf(stderr, "peak after the load, before the view: %.1f MB\n", loadPeak / 1e3);
     timer.restart();
     QCoreApplication::processEvents();  // the rows reach the view
     const double flush = timer.nsecsElapsed() / 1e6;

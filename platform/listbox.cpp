@@ -126,22 +126,7 @@ void Listbox::DetachWidget() {
 void Listbox::SetProperty(const std::string& name, const PropertyValue& value) {
     Control::SetProperty(name, value);
     QTableView& view = View(LiveWidget());
-    if (name == "ColumnCount" || name == "InitialValue") {
-        QStringList headings = QString::fromStdString(StringProperty("InitialValue")).split('\t');
-        const int count = static_cast<int>(IntegerProperty("ColumnCount"));
-        while (headings.size() < count) {
-            headings.append(QString());
-        }
-        Rows().SetColumns(headings.mid(0, std::max(count, 1)));
-    } else if (name == "ColumnWidths") {
-        const auto widths = ParseWidths(std::get<std::string>(value));
-        for (size_t i = 0; i < widths.size(); ++i) {
-            view.setColumnWidth(static_cast<int>(i), widths[i]);
-        }
-    } else if (name == "ColumnsResizable") {
-        view.horizontalHeader()->setSectionResizeMode(
-            std::get<bool>(value) ? QHeaderView::Interactive : QHeaderView::Fixed);
-    } else if (name == "HasHeading") {
+    if (name == "HasHeading") {
         view.horizontalHeader()->setVisible(std::get<bool>(value));
     } else if (name == "DefaultRowHeight") {
         Rows().SetRowHeight(static_cast<int>(std::get<long long>(value)));
@@ -151,6 +136,29 @@ void Listbox::SetProperty(const std::string& name, const PropertyValue& value) {
                                                               : Qt::ScrollBarAlwaysOff);
     } else if (name == "Border") {
         view.setFrameShape(std::get<bool>(value) ? QFrame::StyledPanel : QFrame::NoFrame);
+    }
+}
+
+// Columns, headings and widths together, once the block has given all three: each new set of
+// columns resets the model and its header.
+void Listbox::PropertiesApplied() {
+    Control::PropertiesApplied();
+    if (!Property("ColumnCount") && !Property("InitialValue")) {
+        return;
+    }
+    QTableView& view = View(LiveWidget());
+    QStringList headings = QString::fromStdString(StringProperty("InitialValue")).split('\t');
+    const int count = static_cast<int>(IntegerProperty("ColumnCount"));
+    while (headings.size() < count) {
+        headings.append(QString());
+    }
+    Rows().SetColumns(headings.mid(0, std::max(count, 1)));
+    view.horizontalHeader()->setSectionResizeMode(
+        BoolProperty("ColumnsResizable") ? QHeaderView::Interactive : QHeaderView::Fixed);
+    const auto widths =
+        Property("ColumnWidths") ? ParseWidths(StringProperty("ColumnWidths")) : std::vector<int>{};
+    for (size_t i = 0; i < widths.size(); ++i) {
+        view.setColumnWidth(static_cast<int>(i), widths[i]);
     }
 }
 

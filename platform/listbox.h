@@ -18,6 +18,7 @@ class Listbox : public Control {
     Listbox();
     ~Listbox() override;
     void SetProperty(const std::string& name, const PropertyValue& value) override;
+    void PropertiesApplied() override;
     void DetachWidget() override;
 
     void DeleteAllRows();
