@@ -26,27 +26,11 @@ QMenu* NativeMenu(const Ref<class Window1>& window, const char* name) {
 }
 }  // namespace
 
-TEST_F(MenuTest, TheBarHoldsFileAndEditInOrder) {
+TEST_F(MenuTest, TheBarIsBuiltOnceAndFindsItsItems) {
     auto bar = MainMenuBar();
     EXPECT_EQ(bar, MainMenuBar()) << "built once";
-    ASSERT_EQ(bar->Count(), 2);
-    EXPECT_EQ(bar->Item(0)->Text, "&File");
-    EXPECT_EQ(bar->Item(1)->Text, "&Edit");
-    auto file = bar->Child("FileMenu");
-    ASSERT_EQ(file->Count(), 1);
-    EXPECT_FALSE(Cast<QuitMenuItem>(file->Item(0)).IsNil());
-    EXPECT_EQ(file->Item(0)->KeyboardShortcut, "Cmd+Q");
-
-    const char* names[] = {"EditUndo",  "EditSeparator1", "EditCut",        "EditCopy",
-                           "EditPaste", "EditClear",      "EditSeparator2", "EditSelectAll"};
-    auto edit = bar->Child("EditMenu");
-    ASSERT_EQ(edit->Count(), 8);
-    for (long long i = 0; i < 8; ++i) {
-        EXPECT_EQ(edit->Item(i)->Name, names[i]);
-        EXPECT_TRUE(edit->Item(i)->AutoEnable);
-    }
-    EXPECT_EQ(edit->Item(5)->Text, "&Delete");
-    EXPECT_EQ(edit->Item(5)->KeyboardShortcut, "");
+    EXPECT_FALSE(Cast<QuitMenuItem>(bar->Child("FileMenu")->Item(0)).IsNil());
+    EXPECT_EQ(bar->Child("EditMenu")->Count(), 8);
     EXPECT_FALSE(bar->_Lookup("EditSelectAll").IsNil());
     EXPECT_TRUE(bar->Child("EditSelectAll").IsNil()) << "Child looks one level down only";
 }

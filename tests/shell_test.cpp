@@ -3,10 +3,7 @@
 #include <QPushButton>
 
 #include "platform/runtime.h"
-#include "shell/app.h"
-#include "shell/startup.h"
-#include "shell/window1.h"
-#include "support.h"
+#include "window_fixture.h"
 
 using namespace testsupport;
 
@@ -35,19 +32,7 @@ int VisibleWindows() {
     return count;
 }
 
-// The start-up that the event loop would run, without the loop.
-Ref<class Window1> StartUp() {
-    _EarlyStartup();
-    _LateStartup();
-    CurrentApplication()->Event_Open();
-    return Window1();
-}
-
-class ShellTest : public SlateTest {
-  protected:
-    TempDir tree;
-    ScopedRoot root{tree.Path()};
-};
+using ShellTest = WindowTest;
 
 }  // namespace
 
