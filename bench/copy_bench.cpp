@@ -13,9 +13,9 @@
 #include <string>
 #include <vector>
 
+#include "installer/copy.h"
 #include "platform/runtime.h"
-#include "shell/startup.h"
-#include "shell/window1.h"
+#include "timing.h"
 
 namespace fs = std::filesystem;
 
@@ -36,27 +36,12 @@ void MakeTree(const fs::path& bundle) {
     }
 }
 
-double Median(std::vector<double> values) {
-    std::sort(values.begin(), values.end());
-    return values[values.size() / 2];
-}
-
-template <class F>
-double Milliseconds(F&& work) {
-    const auto start = std::chrono::steady_clock::now();
-    work();
-    return std::chrono::duration<double, std::milli>(std::chrono::steady_clock::now() - start)
-        .count();
-}
-
 }  // namespace
 
 int main(int argc, char** argv) {
     const int runs = argc > 1 ? std::atoi(argv[1]) : 7;
     setenv("QT_QPA_PLATFORM", "offscreen", 0);
     RuntimeInit(argc, argv);
-    _EarlyStartup();
-    auto window = Window1();
 
     std::string pattern = (fs::temp_directory_path() / "orbelane-copy-XXXXXX").string();
     const fs::path work = mkdtemp(pattern.data());
@@ -70,13 +55,10 @@ int main(int argc, char** argv) {
         fs::create_directories(b);
         std::system("sync");
         ours.push_back(Milliseconds([&] {
-            window->CopyFileOrFolder(GetFolderItem(source.string(), 3),
-                                     GetFolderItem(a.string(), 3));
+            CopyFileOrFolder(GetFolderItem(source.string(), 3), GetFolderItem(a.string(), 3));
         }));
         std::system("sync");
-        cp.push_back(Milliseconds([&] {
-            std::system(("cp -r '" + source.string() + "' '" + b.string() + "/'").c_str());
-        }));
+        cp.push_back(TimeCommand("cp -r '" + source.string() + "' '" + b.string() + "/'"));
         fs::remove_all(a);
         fs::remove_all(b);
     }

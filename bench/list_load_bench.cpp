@@ -20,6 +20,7 @@
 #include "scripts/demo_tree.h"
 #include "shell/startup.h"
 #include "shell/window1.h"
+#include "timing.h"
 
 namespace fs = std::filesystem;
 
@@ -34,11 +35,6 @@ long StatusKilobytes(const char* key) {
         }
     }
     return 0;
-}
-
-double Median(std::vector<double> values) {
-    std::sort(values.begin(), values.end());
-    return values[values.size() / 2];
 }
 
 // One load in a fresh process: prints "load flush peak shown open" (ms, ms, bytes, bytes, ms).
@@ -77,15 +73,6 @@ int MeasureOneLoad(int argc, char** argv, const char* root) {
                 list->ListCount());
     std::fflush(stdout);
     std::_Exit(0);
-}
-
-double TimeCommand(const std::string& command) {
-    const auto start = std::chrono::steady_clock::now();
-    if (std::system(command.c_str()) != 0) {
-        std::fprintf(stderr, "failed: %s\n", command.c_str());
-    }
-    return std::chrono::duration<double, std::milli>(std::chrono::steady_clock::now() - start)
-        .count();
 }
 
 }  // namespace

@@ -9,6 +9,8 @@
 #include <string>
 #include <vector>
 
+#include "timing.h"
+
 extern char** environ;
 
 namespace {
@@ -28,11 +30,6 @@ double RunMilliseconds(const std::string& program, const char* argument = nullpt
         std::fprintf(stderr, "%s did not show its window\n", program.c_str());
     }
     return std::chrono::duration<double, std::milli>(end - start).count();
-}
-
-double Median(std::vector<double> values) {
-    std::sort(values.begin(), values.end());
-    return values[values.size() / 2];
 }
 
 }  // namespace

@@ -2,6 +2,8 @@
 // designed; the hairlines are a quarter-strength black over the frame's edges.
 #include "drawing/rect_box.h"
 
+#include "platform/property_block.h"
+
 namespace {
 constexpr double kArc = 14;
 constexpr double kInnerArc = 12;
@@ -67,6 +69,18 @@ void DrawTitle(Graphics& g, const std::string& title) {
 }
 
 }  // namespace
+
+// The frame's own properties are known once the first frame exists, before any block for it
+// is built or read.
+RectBox::RectBox() {
+    static const bool registered = [] {
+        RegisterProperty("colour", PropertyType::Colour);
+        RegisterProperty("linesize", PropertyType::Integer);
+        RegisterProperty("title", PropertyType::String);
+        return true;
+    }();
+    (void)registered;
+}
 
 void RectBox::SetProperty(const std::string& name, const PropertyValue& value) {
     Canvas::SetProperty(name, value);

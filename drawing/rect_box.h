@@ -9,6 +9,7 @@
 
 class RectBox : public Canvas {
   public:
+    RectBox();
     void SetProperty(const std::string& name, const PropertyValue& value) override;
     void Event_Paint(Ref<Graphics> g, const std::vector<Rect>& areas) override;
 

@@ -1,9 +1,9 @@
 // CopyFileOrFolder: one item, a file or a whole folder tree, into a folder, under its own name.
-#include "shell/window1.h"
+#include "installer/copy.h"
 
-// The folder is created first and filled afterwards; nothing is checked and nothing caught,
-// so an exception at any depth leaves the items copied so far in place.
-void Window1::CopyFileOrFolder(Ref<FolderItem> source, Ref<FolderItem> destination) {
+#include "platform/runtime.h"
+
+void CopyFileOrFolder(Ref<FolderItem> source, Ref<FolderItem> destination) {
     StackCheck stackCheck;
     if (!source->Directory()) {
         source->CopyFileTo(destination);

@@ -5,6 +5,8 @@
 #include <QPalette>
 #include <QStyle>
 
+#include "platform/qt_color.h"
+
 namespace {
 constexpr int kMiddleLightness = 128;
 
@@ -33,8 +35,7 @@ bool IsDarkMode() {
 }
 
 Color FillColor() {
-    const QColor c = QApplication::palette().color(QPalette::Window);
-    return RGB(c.red(), c.green(), c.blue());
+    return FromQColor(QApplication::palette().color(QPalette::Window));
 }
 
 void SetAppearanceForTesting(Appearance appearance) {

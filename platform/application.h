@@ -21,7 +21,10 @@ class Application {
     // True if the exception was dealt with; an application without a handler answers False.
     virtual bool UnhandledException(const RuntimeException&) { return false; }
 
-    // Runs an event handler; what leaves it goes by the rule of the run-time (see .cpp).
+    // Runs an event handler and settles what leaves it: EndException and ThreadEndException
+    // pass in silence, any other RuntimeException goes to UnhandledException and then, if
+    // that answers False, to the last resort. Unlike the global helper of the same name, it
+    // hands nothing back.
     void _CallFunctionWithExceptionHandling(const std::function<void()>& function);
     // Raises AppearanceChanged for either of the two appearance notification names.
     void _MacOSNotificationReceived(const std::string& name);

@@ -6,6 +6,7 @@
 #include <QWidget>
 
 #include "platform/application.h"
+#include "platform/qt_color.h"
 
 namespace {
 class CanvasWidget : public QWidget {
@@ -19,9 +20,8 @@ class CanvasWidget : public QWidget {
             return;
         }
         QPainter painter(this);
-        const QColor ground = palette().color(QPalette::Window);
         auto g = New<Graphics>(painter, width(), height(),
-                               RGB(ground.red(), ground.green(), ground.blue()));
+                               FromQColor(palette().color(QPalette::Window)));
         std::vector<Rect> areas;
         for (const QRect& r : event->region()) {
             areas.push_back({r.left(), r.top(), r.width(), r.height()});

@@ -8,6 +8,7 @@
 
 #include <cmath>
 
+#include "platform/qt_color.h"
 #include "platform/window.h"
 
 Control::Control() : context_(std::make_unique<QObject>()) {}
@@ -48,8 +49,8 @@ void Control::SetProperty(const std::string& name, const PropertyValue& value) {
         // Active and inactive only: a disabled control keeps the desktop's greyed text.
         QPalette palette = widget_->palette();
         for (auto group : {QPalette::Active, QPalette::Inactive}) {
-            palette.setColor(group, QPalette::WindowText, QColor(Red(c), Green(c), Blue(c)));
-            palette.setColor(group, QPalette::Text, QColor(Red(c), Green(c), Blue(c)));
+            palette.setColor(group, QPalette::WindowText, ToQColor(c));
+            palette.setColor(group, QPalette::Text, ToQColor(c));
         }
         widget_->setPalette(palette);
     }

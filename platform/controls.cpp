@@ -9,6 +9,7 @@
 #include <QTabWidget>
 
 #include "platform/application.h"
+#include "platform/qt_color.h"
 #include "platform/window.h"
 
 namespace {
@@ -191,7 +192,7 @@ void TextArea::SetProperty(const std::string& name, const PropertyValue& value) 
     } else if (name == "BackColor") {
         const Color c = std::get<ColorWord>(value).value;
         QPalette palette = edit.palette();
-        palette.setColor(QPalette::Base, QColor(Red(c), Green(c), Blue(c)));
+        palette.setColor(QPalette::Base, ToQColor(c));
         edit.setPalette(palette);
     } else if (name == "ScrollbarVertical") {
         edit.setVerticalScrollBarPolicy(std::get<bool>(value) ? Qt::ScrollBarAsNeeded

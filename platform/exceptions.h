@@ -54,7 +54,10 @@ class ThreadEndException : public RuntimeException {
 };
 
 // The global exception helper that _Main installs: runs `function(argument)` and hands back a
-// RuntimeException that left it, or nullptr. Anything else goes on up.
+// RuntimeException that left it, or nullptr. It catches every RuntimeException alike and
+// decides nothing; anything else goes on up. Not to be confused with
+// Application::_CallFunctionWithExceptionHandling, which runs event handlers and itself decides
+// what an exception leads to.
 std::shared_ptr<RuntimeException> _CallFunctionWithExceptionHandling(
     const std::function<void(void*)>& function, void* argument);
 

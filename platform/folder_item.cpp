@@ -88,7 +88,7 @@ std::string FolderItem::ShellPath() const {
         (path.size() == root.size() || path[root.size()] == '/')) {
         path.erase(0, root.size());
         if (path.empty()) {
-            path = "/";
+            path.push_back('/');  // not `= "/"`, which trips a false -Wrestrict in GCC 12
         }
     }
     std::string out;

@@ -8,14 +8,7 @@
 #include <algorithm>
 #include <cmath>
 
-namespace {
-QColor ToQColor(Color color, double transparency) {
-    const double opacity = 1.0 - std::clamp(transparency, 0.0, 100.0) / 100.0;
-    const double wordOpacity = 1.0 - Transparency(color) / 255.0;
-    return QColor(Red(color), Green(color), Blue(color),
-                  static_cast<int>(std::lround(255.0 * opacity * wordOpacity)));
-}
-}  // namespace
+#include "platform/qt_color.h"
 
 Graphics::Graphics(QPainter& painter, int width, int height, Color ground)
     : painter_(painter), width_(width), height_(height), ground_(ground) {

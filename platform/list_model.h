@@ -21,7 +21,6 @@ class ListModel : public QAbstractTableModel {
     const RowStore& Store() const { return store_; }
     void SetColumns(const QStringList& headings);
     int Columns() const { return static_cast<int>(headings_.size()); }
-    QString Heading(int column) const { return headings_.value(column); }
     void SetRowHeight(int height) { rowHeight_ = height; }
     int RowHeight() const { return rowHeight_; }
     int SortColumn() const { return sortColumn_; }

@@ -1,6 +1,5 @@
 // Listbox over QTableView, which keeps no item per row: fixed columns, a heading that sorts,
-// and a delegate that lets the
-// CellBackgroundPaint event paint the ground of each cell before the list draws its text.
+// and a delegate that lets CellBackgroundPaint paint each cell's ground before its text.
 #include "platform/listbox.h"
 
 #include <QHeaderView>
@@ -10,6 +9,7 @@
 
 #include "platform/application.h"
 #include "platform/list_model.h"
+#include "platform/qt_color.h"
 
 namespace {
 
@@ -45,9 +45,8 @@ class CellDelegate : public QStyledItemDelegate {
         painter.save();
         painter.translate(option.rect.topLeft());
         painter.setClipRect(0, 0, option.rect.width(), option.rect.height());
-        const QColor base = option.palette.color(QPalette::Base);
         auto g = New<Graphics>(painter, option.rect.width(), option.rect.height(),
-                               RGB(base.red(), base.green(), base.blue()));
+                               FromQColor(option.palette.color(QPalette::Base)));
         Listbox& list = *owner_;
         const bool handled = RaiseBooleanEvent(
             [&] { return list.CellBackgroundPaint(list, g, index.row(), index.column()); });
@@ -222,10 +221,6 @@ void Listbox::SetListIndex(long long row) {
     view.setCurrentIndex(Rows().index(static_cast<int>(row), 0));
 }
 
-std::string Listbox::Heading(long long column) const {
-    return Rows().Heading(static_cast<int>(column)).toStdString();
-}
-
 void Listbox::PressHeading(long long column) {
     const bool again = Rows().SortColumn() == column;
     const Qt::SortOrder order = again && Rows().SortOrder() == Qt::AscendingOrder
@@ -235,14 +230,6 @@ void Listbox::PressHeading(long long column) {
     view.horizontalHeader()->setSortIndicatorShown(true);
     view.horizontalHeader()->setSortIndicator(static_cast<int>(column), order);
     Rows().sort(static_cast<int>(column), order);
-}
-
-long long Listbox::SortColumn() const {
-    return Rows().SortColumn();
-}
-
-bool Listbox::SortDescending() const {
-    return Rows().SortOrder() == Qt::DescendingOrder;
 }
 
 ListModel& Listbox::Rows() const {

@@ -33,12 +33,9 @@ class Listbox : public Control {
     // The selected row, or -1.
     long long ListIndex() const;
     void SetListIndex(long long row);
-    std::string Heading(long long column) const;
 
     // As a click of the user on a heading: sorts by it, the other way round on a second click.
     void PressHeading(long long column);
-    long long SortColumn() const;
-    bool SortDescending() const;
 
     std::function<void(Listbox&)> Change;
     std::function<void(Listbox&)> DoubleClick;

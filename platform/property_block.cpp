@@ -1,4 +1,5 @@
-// Encoding and decoding of property blocks; the type of each property name is fixed here.
+// Encoding and decoding of property blocks; the type of each platform property name is fixed
+// here, and a control of the program's own adds its names with RegisterProperty.
 #include "platform/property_block.h"
 
 #include <cstring>
@@ -8,10 +9,10 @@
 
 namespace {
 
-const std::unordered_map<std::string_view, PropertyType>& PropertyTypes() {
+std::unordered_map<std::string, PropertyType>& PropertyTypes() {
     using T = PropertyType;
-    static const std::unordered_map<std::string_view, PropertyType> types = [] {
-        std::unordered_map<std::string_view, PropertyType> map;
+    static std::unordered_map<std::string, PropertyType> types = [] {
+        std::unordered_map<std::string, PropertyType> map;
         for (auto name : {"Visible",
                           "Enabled",
                           "AutoDeactivate",
@@ -90,11 +91,10 @@ const std::unordered_map<std::string_view, PropertyType>& PropertyTypes() {
                           "GridLinesHorizontal",
                           "GridLinesVertical",
                           "LimitText",
-                          "Alignment",
-                          "linesize"}) {
+                          "Alignment"}) {
             map.emplace(name, T::Integer);
         }
-        for (auto name : {"BackColor", "TextColor", "colour"}) {
+        for (auto name : {"BackColor", "TextColor"}) {
             map.emplace(name, T::Colour);
         }
         map.emplace("TextSize", T::Single);
@@ -102,7 +102,7 @@ const std::unordered_map<std::string_view, PropertyType>& PropertyTypes() {
         map.emplace("LineSpacing", T::Double);
         for (auto name : {"Title", "Name", "InitialParent", "TextFont", "Text", "HelpTag",
                           "DataSource", "DataField", "InitialValue", "ColumnWidths",
-                          "TabDefinition", "Format", "Mask", "title", "Caption"}) {
+                          "TabDefinition", "Format", "Mask", "Caption"}) {
             map.emplace(name, T::String);
         }
         return map;
@@ -139,8 +139,12 @@ T ReadRaw(std::string_view block, size_t& at) {
 
 PropertyType TypeOfProperty(std::string_view name) {
     const auto& types = PropertyTypes();
-    const auto found = types.find(name);
+    const auto found = types.find(std::string(name));
     return found == types.end() ? PropertyType::Nothing : found->second;
+}
+
+void RegisterProperty(std::string_view name, PropertyType type) {
+    PropertyTypes().insert_or_assign(std::string(name), type);
 }
 
 PropertyBlock& PropertyBlock::Add(std::string_view name, PropertyValue value) {

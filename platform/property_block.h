@@ -22,6 +22,8 @@ using PropertyValue = std::variant<bool, long long, ColorWord, float, double, st
 // The type that a property name has in a block; Nothing for a name that no class knows.
 enum class PropertyType { Nothing, Boolean, Integer, Colour, Single, Double, String };
 PropertyType TypeOfProperty(std::string_view name);
+// Gives a name of a control's own its type, so that blocks can carry it.
+void RegisterProperty(std::string_view name, PropertyType type);
 
 // Builds a block. A value of another type than the property's raises, so that every block
 // that the program builds is one that _SetProperties can read back.

@@ -39,26 +39,6 @@ std::string_view FieldOf(const char* record, int field) {
     }
 }
 
-char Fold(char c) {
-    return (c >= 'A' && c <= 'Z') ? static_cast<char>(c + 32) : c;
-}
-
-// Byte order with ASCII letters folded; other text goes to the run-time's comparison.
-int CompareForSort(std::string_view a, std::string_view b) {
-    const size_t n = std::min(a.size(), b.size());
-    for (size_t i = 0; i < n; ++i) {
-        if ((static_cast<unsigned char>(a[i]) | static_cast<unsigned char>(b[i])) >= 0x80) {
-            return RuntimeStringCompare(a.substr(i), b.substr(i));
-        }
-        const char ca = Fold(a[i]);
-        const char cb = Fold(b[i]);
-        if (ca != cb) {
-            return ca < cb ? -1 : 1;
-        }
-    }
-    return a.size() == b.size() ? 0 : (a.size() < b.size() ? -1 : 1);
-}
-
 }  // namespace
 
 void RowStore::SetFieldCount(int fieldCount) {
@@ -138,7 +118,7 @@ std::vector<uint32_t> RowStore::SortBy(int field, bool descending) {
     std::vector<uint32_t> order(rows_.size());
     std::iota(order.begin(), order.end(), 0u);
     std::stable_sort(order.begin(), order.end(), [&](uint32_t a, uint32_t b) {
-        const int c = CompareForSort(Field(a, field), Field(b, field));
+        const int c = RuntimeStringCompare(Field(a, field), Field(b, field));
         return descending ? c > 0 : c < 0;
     });
     std::vector<uint64_t> sorted(rows_.size());
@@ -148,14 +128,6 @@ std::vector<uint32_t> RowStore::SortBy(int field, bool descending) {
     rows_ = std::move(sorted);
     lastRecord_ = UINT64_MAX;
     return order;
-}
-
-size_t RowStore::Bytes() const {
-    size_t bytes = rows_.capacity() * sizeof(uint64_t);
-    for (size_t size : chunkSizes_) {
-        bytes += size;
-    }
-    return bytes;
 }
 
 // A location is the chunk's number in the high half and the offset in the low half.

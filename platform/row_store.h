@@ -24,8 +24,6 @@ class RowStore {
     // Sorts the rows by one field, case aside, keeping the order of equal rows. Returns, for
     // each new position, the row's old position.
     std::vector<uint32_t> SortBy(int field, bool descending);
-    // Bytes held, for the memory figures of the benchmarks.
-    size_t Bytes() const;
 
   private:
     static constexpr size_t kChunkSize = 1 << 20;

@@ -316,12 +316,6 @@ int RuntimeStringCompare(std::string_view first, std::string_view second) {
     return a == first.size() ? -1 : 1;
 }
 
-std::string RuntimeAddString(std::string_view first, std::string_view second) {
-    std::string out(first);
-    out += second;
-    return out;
-}
-
 bool TextEquals(std::string_view first, std::string_view second) {
     return RuntimeStringCompare(first, second) == 0;
 }

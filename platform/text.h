@@ -17,7 +17,6 @@ std::string Str(long long value, std::string_view format = {});
 std::string Chr(long long code);
 // 0 when the two texts are equal, case aside; otherwise the sign of their order.
 int RuntimeStringCompare(std::string_view first, std::string_view second);
-std::string RuntimeAddString(std::string_view first, std::string_view second);
 bool TextEquals(std::string_view first, std::string_view second);
 
 // The run-time's conversion of a double to a 64-bit integer: towards zero, saturating at the

@@ -12,6 +12,7 @@
 #include "platform/application.h"
 #include "platform/menu.h"
 #include "platform/native_window.h"
+#include "platform/qt_color.h"
 
 namespace {
 std::vector<std::shared_ptr<Window>> openWindows;
@@ -88,7 +89,7 @@ void Window::SetBackColor(Color color) {
     backColor_ = color;
     if (client_) {
         QPalette palette = client_->palette();
-        palette.setColor(QPalette::Window, QColor(Red(color), Green(color), Blue(color)));
+        palette.setColor(QPalette::Window, ToQColor(color));
         client_->setPalette(palette);
         client_->update();
     }

@@ -1,6 +1,6 @@
 // Window1: the system's only window, with the installer page, the list page and the report
-// page on PagePanel1 and the two segments of MainTabs above them. Its handlers are defined
-// in the folder of the subsystem that owns them.
+// page on PagePanel1 and the two segments of MainTabs above them. Every handler is defined in
+// shell/, one file a page, and calls down into results/ or installer/.
 #pragma once
 
 #include <string>
@@ -76,6 +76,7 @@ class Window1 : public Window {
     Ref<QuitMenuItem> FileQuit() const { return Cast<QuitMenuItem>(MenuNamed("FileQuit")); }
 
     void Event_Open() override;
+    // Forwards to the installer's copy, which needs no window.
     void CopyFileOrFolder(Ref<FolderItem> source, Ref<FolderItem> destination);
 
   private:

@@ -268,6 +268,16 @@ std::string PropertiesOf(const ControlRow& row) {
     return block.Bytes();
 }
 
+// The row of a control by its name and, in a control set, its index.
+const ControlRow& RowNamed(std::string_view name, long long index = Control::kNoIndex) {
+    for (const ControlRow& row : ControlTable()) {
+        if (row.name == name && row.index == index) {
+            return row;
+        }
+    }
+    throw OutOfBoundsException("No control row " + std::string(name));
+}
+
 // One row: allocate, enter under its name, look it up again and give it its properties.
 Ref<Control> CreateRow(class Window1& window, const ControlRow& row) {
     window._AddControl(Make(row.kind, row.index), row.name);
@@ -285,21 +295,23 @@ void Window1::CreateControls() {
     _CreateControls1();
 }
 
-// Rows 1 to 30. Handlers are bound after the properties, so that PagePanel1's Value 0 raises
-// no Change.
+// The rows up to the seventh element of Label6. Handlers are bound after the properties, so
+// that PagePanel1's Value 0 raises no Change.
 void Window1::_CreateControls0() {
-    const auto& table = ControlTable();
-    for (size_t i = 0; i < 30; ++i) {
-        BindHandlers(*CreateRow(*this, table[i]));
+    const ControlRow& last = RowNamed("Label6", 7);
+    for (const ControlRow& row : ControlTable()) {
+        BindHandlers(*CreateRow(*this, row));
+        if (&row == &last) {
+            break;
+        }
     }
 }
 
-// Rows 31 to 33; MainTabs gets its segments before its handler.
+// The last three rows; MainTabs gets its segments before its handler.
 void Window1::_CreateControls1() {
-    const auto& table = ControlTable();
-    BindHandlers(*CreateRow(*this, table[30]));
-    BindHandlers(*CreateRow(*this, table[31]));
-    CreateRow(*this, table[32]);
+    BindHandlers(*CreateRow(*this, RowNamed("Label5", 7)));
+    BindHandlers(*CreateRow(*this, RowNamed("Label6", 8)));
+    CreateRow(*this, RowNamed("MainTabs"));
     Ref<SegmentedControl> tabs = MainTabs();
     auto installation = New<SegmentedControlItem>();
     installation->SetTitle("Installation");

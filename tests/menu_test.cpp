@@ -1,5 +1,7 @@
 // The menu bar: its structure, its native form in the window, and quitting.
 #include <QAction>
+#include <QClipboard>
+#include <QGuiApplication>
 #include <QMainWindow>
 #include <QMenu>
 #include <QMenuBar>
@@ -65,6 +67,9 @@ TEST_F(MenuTest, CopyAndSelectAllWorkOnTheFocusedReportText) {
     window->EditSelectAll()->Action();
     auto* editor = static_cast<QPlainTextEdit*>(window->TextArea1()->Widget());
     EXPECT_EQ(editor->textCursor().selectedText().size(), editor->toPlainText().size());
+    QGuiApplication::clipboard()->clear();
+    window->EditCopy()->Action();
+    EXPECT_EQ(QGuiApplication::clipboard()->text().toStdString(), "    Bar 1 330\nBar 2 660");
 }
 
 TEST_F(MenuTest, QuitEndsTheEventLoopAndClosesTheWindow) {

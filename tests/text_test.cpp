@@ -106,7 +106,6 @@ TEST(Text, StrChrAndComparison) {
     EXPECT_FALSE(TextEquals("\xF8\x80\x80", "\xE8\x80\x80"))
         << "invalid bytes stand for themselves";
     EXPECT_FALSE(TextEquals("\xFF\xBF", "\xDF\xBF"));
-    EXPECT_EQ(RuntimeAddString("Adobe Illustrator ", "22"), "Adobe Illustrator 22");
 }
 
 }  // namespace

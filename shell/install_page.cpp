@@ -1,4 +1,5 @@
 // The installation page: the product list and "Install Now", with every message of a press.
+#include "installer/copy.h"
 #include "installer/plugin_folders.h"
 #include "platform/message_box.h"
 #include "platform/text.h"
@@ -66,4 +67,8 @@ void Window1::PushButton1_Action(PushButton&) {
     } catch (...) {
         MsgBox(kFailed);
     }
+}
+
+void Window1::CopyFileOrFolder(Ref<FolderItem> source, Ref<FolderItem> destination) {
+    ::CopyFileOrFolder(std::move(source), std::move(destination));
 }

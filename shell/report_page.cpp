@@ -9,8 +9,9 @@ constexpr long long kReportPage = 2;
 const std::string kIndent = "    ";
 }  // namespace
 
-// Nothing here catches: an exception leaves the record set and the database unclosed and
-// the page unchanged. A text that fails the report test changes nothing on the screen.
+// Nothing here catches: an exception goes to the run-time with the page as it stands, and the
+// record set and the database close as their last references go. A text that fails the
+// report test changes nothing on the screen.
 void Window1::Listbox1_DoubleClick(Listbox& sender) {
     auto db = New<SQLiteDatabase>();
     const std::string id = VariantToString(sender.RowTag(sender.ListIndex()));

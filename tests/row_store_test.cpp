@@ -1,0 +1,122 @@
+// RowStore against a plain vector of rows: the same random operations on both, then the same
+// texts, so rewrites in place, chunk boundaries, long lengths and oversized cells are covered.
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <random>
+#include <string>
+#include <vector>
+
+#include "platform/row_store.h"
+#include "platform/text.h"
+
+namespace {
+
+constexpr int kFields = 4;
+constexpr size_t kMiB = 1 << 20;
+
+using Rows = std::vector<std::vector<std::string>>;
+
+void ExpectSame(const RowStore& store, const Rows& model, const std::string& step) {
+    ASSERT_EQ(store.Count(), model.size()) << step;
+    for (size_t row = 0; row < model.size(); ++row) {
+        for (int field = 0; field < kFields; ++field) {
+            ASSERT_EQ(store.Field(row, field), model[row][field])
+                << step << ": row " << row << " field " << field;
+        }
+    }
+}
+
+class Driver {
+  public:
+    explicit Driver(unsigned seed) : random_(seed) {}
+
+    // Mostly short texts, with lengths around the one- and two-byte length prefixes, some of
+    // a few kilobytes to fill chunks, and now and then one larger than a whole chunk.
+    std::string Text() {
+        static const size_t kEdges[] = {0, 1, 127, 128, 129, 16383, 16384, 16385};
+        const int kind = Pick(100);
+        size_t length = 0;
+        if (kind < 50) {
+            length = static_cast<size_t>(Pick(24));
+        } else if (kind < 75) {
+            length = kEdges[Pick(std::size(kEdges))];
+        } else if (kind < 98) {
+            length = 1000 + static_cast<size_t>(Pick(60000));
+        } else {
+            length = kMiB + static_cast<size_t>(Pick(4096));
+        }
+        return std::string(length, static_cast<char>('a' + Pick(26)));
+    }
+    int Pick(size_t bound) { return static_cast<int>(random_() % bound); }
+
+  private:
+    std::mt19937 random_;
+};
+
+void SortModel(Rows& model, int field, bool descending) {
+    std::stable_sort(model.begin(), model.end(), [&](const auto& a, const auto& b) {
+        const int c = RuntimeStringCompare(a[field], b[field]);
+        return descending ? c > 0 : c < 0;
+    });
+}
+
+class RowStoreRandomTest : public ::testing::TestWithParam<unsigned> {};
+
+TEST_P(RowStoreRandomTest, AgreesWithAPlainVectorOfRows) {
+    Driver driver(GetParam());
+    RowStore store(kFields);
+    Rows model;
+    for (int step = 0; step < 3000; ++step) {
+        const int op = driver.Pick(100);
+        const std::string name = "step " + std::to_string(step);
+        if (op < 30 || model.empty()) {
+            store.AddRow();
+            model.emplace_back(kFields);
+        } else if (op < 60) {
+            // Fills the last row, left to right, as a list load does.
+            const size_t row = model.size() - 1;
+            const int field = driver.Pick(kFields);
+            const std::string text = driver.Text();
+            store.SetField(row, field, text);
+            model[row][field] = text;
+        } else if (op < 97) {
+            // Rewrites any row, most often one that is not the last.
+            const size_t row = static_cast<size_t>(driver.Pick(model.size()));
+            const int field = driver.Pick(kFields);
+            const std::string text = driver.Text();
+            store.SetField(row, field, text);
+            model[row][field] = text;
+        } else if (op < 99) {
+            const int field = driver.Pick(kFields);
+            const bool descending = driver.Pick(2) == 1;
+            store.SortBy(field, descending);
+            SortModel(model, field, descending);
+            ExpectSame(store, model, name + " (sort)");
+        } else {
+            store.Clear();
+            model.clear();
+        }
+        if (step % 250 == 0) {
+            ExpectSame(store, model, name);
+        }
+    }
+    ExpectSame(store, model, "end");
+}
+
+INSTANTIATE_TEST_SUITE_P(Seeds, RowStoreRandomTest, ::testing::Values(1u, 2u, 3u, 42u),
+                         [](const auto& info) { return "Seed" + std::to_string(info.param); });
+
+TEST(RowStoreTest, SortReturnsTheOldPositionOfEachRow) {
+    RowStore store(1);
+    for (const char* text : {"b", "A", "c", "a"}) {
+        store.AddRow();
+        store.SetField(store.Count() - 1, 0, text);
+    }
+    const std::vector<uint32_t> order = store.SortBy(0, false);
+    EXPECT_EQ(order, (std::vector<uint32_t>{1, 3, 0, 2})) << "equal rows keep their order";
+    EXPECT_EQ(store.Field(0, 0), "A");
+    EXPECT_EQ(store.Field(3, 0), "c");
+}
+
+}  // namespace
