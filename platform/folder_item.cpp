@@ -7,6 +7,11 @@
 #include <cstdlib>
 #include <system_error>
 
+#include <QFile>
+#include <QStandardPaths>
+
+#include "platform/resources_folder.h"
+
 namespace fs = std::filesystem;
 
 namespace {
@@ -29,11 +34,6 @@ std::string Unescape(const std::string& shellPath) {
         out += shellPath[i];
     }
     return out;
-}
-
-fs::path ExecutablePath() {
-    std::error_code error;
-    return fs::read_symlink("/proc/self/exe", error);
 }
 
 Ref<FolderItem> MakeFromNative(const std::string& native) {
@@ -164,12 +164,7 @@ Ref<FolderItem> SpecialFolder::Resources() {
     static Ref<FolderItem> resources;
     fs::path folder = resourcesForTesting;
     if (folder.empty()) {
-        const fs::path executable = ExecutablePath();
-#ifdef __APPLE__
-        folder = executable.parent_path().parent_path() / "Resources";
-#else
-        folder = executable.parent_path() / (executable.filename().string() + " Resources");
-#endif
+        folder = ResourcesFolderFor(ExecutableFile());
     }
     // Made once, and again only when the one made before no longer exists or has moved.
     if (resources.IsNil() || !resources->Exists() || resources->NativePath() != folder) {
@@ -183,15 +178,9 @@ Ref<FolderItem> SpecialFolder::ApplicationData() {
     if (!root.empty()) {
         return GetFolderItem((root / "Users/user/Library/Application Support").string(), 3);
     }
-    const char* home = std::getenv("HOME");
-#ifdef __APPLE__
-    return home ? GetFolderItem(std::string(home) + "/Library/Application Support", 3) : nullptr;
-#else
-    if (const char* xdg = std::getenv("XDG_DATA_HOME"); xdg && *xdg) {
-        return GetFolderItem(xdg, 3);
-    }
-    return home ? GetFolderItem(std::string(home) + "/.local/share", 3) : nullptr;
-#endif
+    // ~/Library/Application Support on macOS, the XDG data home elsewhere.
+    const QString data = QStandardPaths::writableLocation(QStandardPaths::GenericDataLocation);
+    return GetFolderItem(QFile::encodeName(data).toStdString(), 3);
 }
 
 fs::path FileSystemRoot() {

@@ -48,8 +48,8 @@ class FolderItem {
 Ref<FolderItem> GetFolderItem(const std::string& path, long long mode);
 
 namespace SpecialFolder {
-// The application's own resources: Contents/Resources of the bundle on macOS; elsewhere the
-// folder beside the executable named after it with " Resources" behind.
+// The application's own resources, found from the executable's path (platform/resources_folder.h):
+// in the bundle, under the installation prefix or beside the executable in a build tree.
 Ref<FolderItem> Resources();
 // The user's application data folder.
 Ref<FolderItem> ApplicationData();

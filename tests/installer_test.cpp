@@ -160,6 +160,16 @@ TEST_F(InstallerTest, AMissingSourceIsToldOnceTheTargetIsSettled) {
     EXPECT_EQ(Press(kIllustrator), "Unable to install at this time");
 }
 
+TEST_F(InstallerTest, AMissingResourcesFolderIsToldAsAMissingSource) {
+    fs::remove_all(resources);
+    fs::create_directories(Illustrator("26") / "en_US/Plug-ins");
+    fs::create_directories(Data() / "Adobe/Acrobat/DC/Plug-ins");
+    StartUp();
+    EXPECT_EQ(Press(kIllustrator), "Unable to install at this time");
+    EXPECT_EQ(Press(kAcrobatDC), "Unable to install at this time");
+    EXPECT_TRUE(fs::is_empty(Illustrator("26") / "en_US/Plug-ins"));
+}
+
 TEST_F(InstallerTest, TheDividerRowRaisesOnItsNilTarget) {
     StartUp();
     EXPECT_EQ(Press(kDivider), "Unable to install at this time 1");

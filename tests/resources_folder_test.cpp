@@ -1,0 +1,73 @@
+// The resources rule on each layout the program ships in, built in a temporary folder.
+#include "platform/resources_folder.h"
+
+#include "platform/folder_item.h"
+#include "support.h"
+
+using namespace testsupport;
+namespace fs = std::filesystem;
+
+namespace {
+
+struct Layout {
+    const char* name;
+    const char* executable;  // relative to the temporary folder
+    const char* resources;   // where the plug-ins are put, relative to it
+};
+
+void PrintTo(const Layout& layout, std::ostream* out) {
+    *out << layout.executable;
+}
+
+class ResourcesFolderTest : public ::testing::TestWithParam<Layout> {
+  protected:
+    TempDir tree;
+};
+
+TEST_P(ResourcesFolderTest, FindsThePlugInsOfItsLayout) {
+    const Layout& layout = GetParam();
+    const fs::path executable = tree.Path() / layout.executable;
+    WriteFile(executable,
+              "\x7f"
+              "ELF");
+    for (const char* plugin : {"Quilbrant.aip", "Ostrelin.acroplugin"}) {
+        WriteFile(tree.Path() / layout.resources / plugin / "Contents/Info.plist", "<plist/>");
+    }
+
+    const fs::path folder = ResourcesFolderFor(executable);
+    EXPECT_EQ(folder, tree.Path() / layout.resources);
+    Ref<FolderItem> item = GetFolderItem(folder.string(), 3);
+    ASSERT_FALSE(item.IsNil());
+    EXPECT_TRUE(item->Child("Quilbrant.aip")->Directory());
+    EXPECT_TRUE(item->Child("Ostrelin.acroplugin")->Directory());
+}
+
+TEST_P(ResourcesFolderTest, GivesTheSameFolderWhenNothingStandsThere) {
+    const Layout& layout = GetParam();
+    EXPECT_EQ(ResourcesFolderFor(tree.Path() / layout.executable), tree.Path() / layout.resources);
+    EXPECT_FALSE(fs::exists(tree.Path() / layout.resources));
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Layouts, ResourcesFolderTest,
+    ::testing::Values(
+        Layout{"Bundle", "Orbelane.app/Contents/MacOS/orbelane", "Orbelane.app/Contents/Resources"},
+        Layout{"BundleWithBlanks",
+               "Applications/Orbelane Verification Storage.app/Contents/MacOS/ovs",
+               "Applications/Orbelane Verification Storage.app/Contents/Resources"},
+        Layout{"InstalledUnderUsr", "usr/bin/ovs", "usr/share/ovs"},
+        Layout{"InstalledUnderAPrefixWithBlanks", "opt/my tools/bin/ovs", "opt/my tools/share/ovs"},
+        Layout{"BuildTree", "build/ovs", "build/ovs Resources"},
+        Layout{"BuildTreeInAFolderNamedMacOS", "src/MacOS/ovs", "src/MacOS/ovs Resources"},
+        Layout{"BuildTreeInAFolderNamedContents", "Contents/ovs", "Contents/ovs Resources"}),
+    [](const ::testing::TestParamInfo<Layout>& info) { return std::string(info.param.name); });
+
+TEST(ResourcesFolder, TheRunningProgramLooksBesideItsOwnExecutable) {
+    SetResourcesFolderForTesting({});
+    const fs::path executable = ExecutableFile();
+    ASSERT_TRUE(executable.is_absolute()) << executable;
+    EXPECT_TRUE(fs::exists(executable));
+    EXPECT_EQ(SpecialFolder::Resources()->NativePath(), ResourcesFolderFor(executable));
+}
+
+}  // namespace
