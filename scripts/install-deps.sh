@@ -5,6 +5,8 @@ packages=(cmake make g++ qt6-base-dev libsqlite3-dev libgtest-dev sqlite3 fonts-
   desktop-file-utils dpkg-dev)
 if [ "${1:-}" = "--demo" ]; then
   packages+=(xvfb)
+elif [ "${1:-}" = "--screenshots" ]; then
+  packages+=(xvfb xdotool x11-apps imagemagick)
 fi
 missing=()
 for p in "${packages[@]}"; do

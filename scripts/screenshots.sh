@@ -1,0 +1,36 @@
+#!/usr/bin/env bash
+# Remakes the README's pictures: runs the demo under Xvfb and saves the list page, a report and
+# the installation page as PNG files in docs/. Run it again whenever the window changes.
+# Usage: scripts/screenshots.sh [BUILD_DIR]
+set -euo pipefail
+cd "$(dirname "$0")/.."
+if [ "${1:-}" != "--under-xvfb" ]; then
+  scripts/install-deps.sh --screenshots
+  build=${1:-build}
+  cmake -S . -B "$build" > /dev/null
+  cmake --build "$build" -j"$(nproc)" --target orbelane-verification-storage orbelane-demo-tree
+  exec xvfb-run -a -s "-screen 0 1280x900x24" "$0" --under-xvfb "$build"
+fi
+build=$2
+root=$(mktemp -d -t orbelane-screenshots.XXXXXX)
+trap 'kill "$program" 2>/dev/null; rm -rf "$root"' EXIT
+"$build/orbelane-demo-tree" "$root"
+ORBELANE_ROOT="$root" "$build/orbelane-verification-storage" &
+program=$!
+window=$(timeout 20 xdotool search --sync --onlyvisible --name "^Orbelane Verification Storage$" |
+  head -1)
+mkdir -p docs
+
+# Points in the window's own coordinates: a control's place in the control table, moved down by
+# the height of the menu bar, which stands in the window above the controls.
+menu=19
+shot() {
+  sleep 1
+  xwd -id "$window" -silent | convert xwd:- "docs/$1.png"
+  echo "docs/$1.png"
+}
+shot list
+xdotool mousemove --window "$window" 300 $((180 + menu)) click --repeat 2 --delay 80 1
+shot report
+xdotool mousemove --window "$window" 250 $((32 + menu)) click 1
+shot installation
