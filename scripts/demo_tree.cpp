@@ -63,7 +63,7 @@ std::string ReportText(Layout layout, const std::string& readValue, const std::s
     return text;
 }
 
-std::vector<StoredResult> InventedResults(size_t count, bool oddOnes) {
+std::vector<StoredResult> InventedResults(size_t count, bool oddOnes, int bars) {
     std::mt19937 random(20181104);
     std::vector<StoredResult> rows;
     rows.reserve(count);
@@ -78,7 +78,7 @@ std::vector<StoredResult> InventedResults(size_t count, bool oddOnes) {
         row.grade = kGrades[random() % std::size(kGrades)];
         const Layout layout = i % 3 == 2 ? Layout::B : Layout::A;
         row.results = ReportText(layout, Digits(random, 13), kCodes[random() % std::size(kCodes)],
-                                 12 + static_cast<int>(random() % 8));
+                                 bars > 0 ? bars : 12 + static_cast<int>(random() % 8));
         if (oddOnes && i % 97 == 41) {
             row.results = "Verifier stopped: no barcode found in the selection";
         } else if (oddOnes && i % 89 == 17) {
@@ -134,10 +134,11 @@ void AppendToStore(const fs::path& file, const std::vector<StoredResult>& rows) 
     Check(sqlite3_exec(raw, "commit", nullptr, nullptr, nullptr), raw);
 }
 
-void WriteInventedStore(const fs::path& file, size_t count) {
+void WriteInventedStore(const fs::path& file, size_t count, int bars) {
     constexpr size_t kBatch = 50000;
     for (size_t done = 0; done < count; done += kBatch) {
-        std::vector<StoredResult> rows = InventedResults(std::min(kBatch, count - done), false);
+        std::vector<StoredResult> rows =
+            InventedResults(std::min(kBatch, count - done), false, bars);
         for (size_t i = 0; i < rows.size(); ++i) {
             rows[i].id = std::to_string(done + i + 1);
         }

@@ -26,8 +26,8 @@ std::string ReportText(Layout layout, const std::string& readValue, const std::s
                        int bars);
 
 // Results with realistic texts in both layouts; with `oddOnes`, every so often a malformed text
-// or a NULL column.
-std::vector<StoredResult> InventedResults(size_t count, bool oddOnes = true);
+// or a NULL column. Each report lists `bars` bars in each block, or 12 to 19 when it is 0.
+std::vector<StoredResult> InventedResults(size_t count, bool oddOnes = true, int bars = 0);
 
 inline constexpr const char* kSchema =
     "create table results_store (id text primary key, datetime text, document text, "
@@ -41,7 +41,7 @@ void WriteStore(const std::filesystem::path& file, const std::vector<StoredResul
 void AppendToStore(const std::filesystem::path& file, const std::vector<StoredResult>& rows);
 
 // Writes a store of `count` invented results without holding them all in memory.
-void WriteInventedStore(const std::filesystem::path& file, size_t count);
+void WriteInventedStore(const std::filesystem::path& file, size_t count, int bars = 0);
 
 // Where the program finds the store and the application data under a root.
 std::filesystem::path StorePath(const std::filesystem::path& root);
