@@ -23,6 +23,9 @@ void RuntimeInit(int argc, char** argv) {
     }
     argcKept = argc;
     ownApplication = std::make_unique<QApplication>(argcKept, argv);
+    // The desktop ties the window to the installed desktop entry, and so to its icon, by this
+    // name; the entry is named after the executable.
+    QGuiApplication::setDesktopFileName(QCoreApplication::applicationName());
     // On macOS the application lives on with its menu bar when the window closes; elsewhere
     // a program without a window would have no way left to quit, so it ends with its window.
 #ifdef Q_OS_MACOS
