@@ -1,4 +1,5 @@
-// Appearance over Qt's application palette.
+// Appearance over Qt's application palette; where the desktop's theme gives no dark palette,
+// a dark one of our own stands in.
 #include "platform/appearance.h"
 
 #include <QApplication>
@@ -28,6 +29,11 @@ QPalette DarkPalette() {
     p.setColor(QPalette::ToolTipText, text);
     return p;
 }
+
+QPalette PaletteFor(Appearance appearance) {
+    return appearance == Appearance::Dark ? DarkPalette()
+                                          : QApplication::style()->standardPalette();
+}
 }  // namespace
 
 bool IsDarkMode() {
@@ -38,7 +44,13 @@ Color FillColor() {
     return FromQColor(QApplication::palette().color(QPalette::Window));
 }
 
+// A palette that already is light or dark, as the desktop's own theme may have made it, stays.
+void FollowDesktopAppearance(Appearance appearance) {
+    if ((appearance == Appearance::Dark) != IsDarkMode()) {
+        QApplication::setPalette(PaletteFor(appearance));
+    }
+}
+
 void SetAppearanceForTesting(Appearance appearance) {
-    QApplication::setPalette(
-        appearance == Appearance::Dark ? DarkPalette() : QApplication::style()->standardPalette());
+    QApplication::setPalette(PaletteFor(appearance));
 }

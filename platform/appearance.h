@@ -9,6 +9,7 @@ bool IsDarkMode();
 Color FillColor();
 
 enum class Appearance { Light, Dark };
-// Puts the whole application into a light or dark palette, as a desktop change would, with
-// the notifications that such a change brings.
+// Puts the whole application into the light or dark palette that the desktop asks for.
+void FollowDesktopAppearance(Appearance appearance);
+// The same, as a desktop change would come, with the notifications that such a change brings.
 void SetAppearanceForTesting(Appearance appearance);

@@ -9,6 +9,7 @@
 
 #include "platform/application.h"
 #include "platform/list_model.h"
+#include "platform/list_view.h"
 #include "platform/qt_color.h"
 
 namespace {
@@ -68,14 +69,14 @@ std::vector<int> ParseWidths(const std::string& text) {
     return widths;
 }
 
-QTableView& View(QWidget& widget) {
-    return static_cast<QTableView&>(widget);
+ListView& View(QWidget& widget) {
+    return static_cast<ListView&>(widget);
 }
 
 }  // namespace
 
 Listbox::Listbox() : model_(std::make_unique<ListModel>()) {
-    auto* view = new QTableView;
+    auto* view = new ListView;
     view->setShowGrid(false);
     view->setWordWrap(false);
     view->setCornerButtonEnabled(false);
@@ -98,11 +99,8 @@ Listbox::Listbox() : model_(std::make_unique<ListModel>()) {
 
     QObject::connect(view->horizontalHeader(), &QHeaderView::sectionClicked, Context(),
                      [this](int column) { PressHeading(column); });
-    QObject::connect(view, &QTableView::doubleClicked, Context(), [this] {
-        if (DoubleClick) {
-            RaiseEvent([this] { DoubleClick(*this); });
-        }
-    });
+    QObject::connect(view, &QTableView::doubleClicked, Context(), [this] { RaiseDoubleClick(); });
+    view->OpenRequested = [this] { RaiseDoubleClick(); };
     QObject::connect(view->selectionModel(), &QItemSelectionModel::selectionChanged, Context(),
                      [this] {
                          if (Change) {
@@ -145,19 +143,27 @@ void Listbox::PropertiesApplied() {
     if (!Property("ColumnCount") && !Property("InitialValue")) {
         return;
     }
-    QTableView& view = View(LiveWidget());
+    ListView& view = View(LiveWidget());
     QStringList headings = QString::fromStdString(StringProperty("InitialValue")).split('\t');
     const int count = static_cast<int>(IntegerProperty("ColumnCount"));
     while (headings.size() < count) {
         headings.append(QString());
     }
-    Rows().SetColumns(headings.mid(0, std::max(count, 1)));
+    headings = headings.mid(0, std::max(count, 1));
+    Rows().SetColumns(headings);
+    // A screen reader names the list by its heading.
+    view.setAccessibleName(headings.join(", "));
     view.horizontalHeader()->setSectionResizeMode(
         BoolProperty("ColumnsResizable") ? QHeaderView::Interactive : QHeaderView::Fixed);
-    const auto widths =
-        Property("ColumnWidths") ? ParseWidths(StringProperty("ColumnWidths")) : std::vector<int>{};
-    for (size_t i = 0; i < widths.size(); ++i) {
-        view.setColumnWidth(static_cast<int>(i), widths[i]);
+    if (Property("ColumnWidths")) {
+        view.SetDesignedWidths(ParseWidths(StringProperty("ColumnWidths")));
+    }
+}
+
+// Return on the selected row opens it as a double click does.
+void Listbox::RaiseDoubleClick() {
+    if (DoubleClick) {
+        RaiseEvent([this] { DoubleClick(*this); });
     }
 }
 

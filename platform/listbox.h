@@ -47,6 +47,7 @@ class Listbox : public Control {
   private:
     // The model, or NilObjectException once the window that showed the list is gone.
     ListModel& Rows() const;
+    void RaiseDoubleClick();
     void CheckCell(long long row, long long column) const;
     std::unique_ptr<ListModel> model_;
 };

@@ -1,4 +1,5 @@
-// Menus over QMenuBar. The Edit items act on the focused text control as Qt's own editing does.
+// Menus over QMenuBar. The Edit items act on the focused text control as Qt's own editing does,
+// and Copy also on the selected row of a focused list.
 #include "platform/menu.h"
 
 #include <QApplication>
@@ -9,6 +10,7 @@
 #include <QPlainTextEdit>
 
 #include "platform/application.h"
+#include "platform/list_view.h"
 #include "platform/runtime.h"
 
 namespace {
@@ -17,8 +19,17 @@ QPlainTextEdit* FocusedEditor() {
     return qobject_cast<QPlainTextEdit*>(QApplication::focusWidget());
 }
 
-// Enabled state of an Edit item for the focused editor, and the item's effect on it.
-bool EditItemApplies(const std::string& name, const QPlainTextEdit* editor) {
+// A focused list offers its selected row to Copy, and nothing to the other Edit items.
+ListView* FocusedList() {
+    return dynamic_cast<ListView*>(QApplication::focusWidget());
+}
+
+// Whether an Edit item has something to act on in the focused control.
+bool EditItemApplies(const std::string& name) {
+    if (const ListView* list = FocusedList()) {
+        return name == "EditCopy" && !list->SelectionText().isEmpty();
+    }
+    const QPlainTextEdit* editor = FocusedEditor();
     if (!editor) {
         return false;
     }
@@ -35,7 +46,12 @@ bool EditItemApplies(const std::string& name, const QPlainTextEdit* editor) {
     return name == "EditPaste" || name == "EditUndo" ? true : selection;
 }
 
-void DoEditItem(const std::string& name, QPlainTextEdit* editor) {
+void DoEditItem(const std::string& name) {
+    if (ListView* list = FocusedList()) {
+        list->CopySelection();
+        return;
+    }
+    QPlainTextEdit* editor = FocusedEditor();
     if (name == "EditCopy") {
         editor->copy();
     } else if (name == "EditSelectAll") {
@@ -86,11 +102,20 @@ void AddItems(QMenu* menu, const MenuItem& parent) {
     const QList<QAction*> actions = menu->actions();
     if (std::any_of(actions.begin(), actions.end(),
                     [](QAction* a) { return IsEditItem(a->objectName().toStdString()); })) {
+        // The open menu shows what applies to the focused control now. Closed, every item
+        // stays enabled so that its shortcut reaches Action, which checks again.
         QObject::connect(menu, &QMenu::aboutToShow, menu, [menu] {
             for (QAction* action : menu->actions()) {
                 const std::string name = action->objectName().toStdString();
                 if (IsEditItem(name)) {
-                    action->setEnabled(EditItemApplies(name, FocusedEditor()));
+                    action->setEnabled(EditItemApplies(name));
+                }
+            }
+        });
+        QObject::connect(menu, &QMenu::aboutToHide, menu, [menu] {
+            for (QAction* action : menu->actions()) {
+                if (IsEditItem(action->objectName().toStdString())) {
+                    action->setEnabled(true);
                 }
             }
         });
@@ -128,10 +153,8 @@ Ref<MenuItem> MenuItem::_Lookup(const std::string& name) const {
 }
 
 void MenuItem::Action() {
-    if (IsEditItem(Name)) {
-        if (QPlainTextEdit* editor = FocusedEditor(); EditItemApplies(Name, editor)) {
-            DoEditItem(Name, editor);
-        }
+    if (IsEditItem(Name) && EditItemApplies(Name)) {
+        DoEditItem(Name);
     }
 }
 

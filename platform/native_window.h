@@ -1,4 +1,5 @@
-// The Qt top-level widget behind a Window; it tells its owner when the user closes it.
+// The Qt top-level widget behind a Window, which tells its owner when the user closes it, and
+// the client area that holds the controls and leads Tab through them in the window's order.
 #pragma once
 
 #include <QMainWindow>
@@ -6,6 +7,17 @@
 #include <memory>
 
 class Window;
+
+class ClientArea : public QWidget {
+  public:
+    explicit ClientArea(std::weak_ptr<Window> owner) : owner_(std::move(owner)) {}
+
+  protected:
+    bool focusNextPrevChild(bool next) override;
+
+  private:
+    std::weak_ptr<Window> owner_;
+};
 
 class NativeWindow : public QMainWindow {
   public:

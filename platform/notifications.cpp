@@ -1,5 +1,5 @@
-// Appearance notifications. Off macOS, Qt's palette and theme change events stand in for the
-// two distributed notifications of the desktop.
+// Appearance notifications. Off macOS, Qt's palette and theme change events and the
+// freedesktop settings portal stand in for the two distributed notifications of the desktop.
 #include "platform/notifications.h"
 
 #include <QApplication>
@@ -9,7 +9,9 @@
 
 #include <algorithm>
 
+#include "platform/appearance.h"
 #include "platform/application.h"
+#include "platform/desktop_portal.h"
 #include "platform/timer.h"
 
 std::deque<std::string> _MacOSDistributedNotifications::NotificationQueue;
@@ -19,7 +21,19 @@ namespace {
 
 class Observer : public QObject {
   public:
+    Observer() : portal_([this](Appearance appearance) { SchemeChanged(appearance); }) {}
+
+    // Each application starts from the scheme that the desktop asks for at that moment.
+    void FollowDesktopScheme() {
+        if (const auto scheme = portal_.Scheme()) {
+            Follow(*scheme);
+        }
+    }
+
     bool eventFilter(QObject* watched, QEvent* event) override {
+        if (followingPortal_) {
+            return false;
+        }
         if (watched == qApp && event->type() == QEvent::ApplicationPaletteChange) {
             _MacOSDistributedNotifications::gotCalled(
                 _MacOSDistributedNotifications::kColorPreferencesChanged);
@@ -35,7 +49,21 @@ class Observer : public QObject {
     }
 
   private:
+    // The palette follows first, so that IsDarkMode already answers anew when the event comes.
+    void SchemeChanged(Appearance appearance) {
+        Follow(appearance);
+        _MacOSDistributedNotifications::gotCalled(_MacOSDistributedNotifications::kThemeChanged);
+    }
+
+    void Follow(Appearance appearance) {
+        followingPortal_ = true;
+        FollowDesktopAppearance(appearance);
+        followingPortal_ = false;
+    }
+
+    DesktopPortal portal_;
     bool themeQueued_ = false;
+    bool followingPortal_ = false;  // the palette change that follows is told once, as a theme
 };
 
 Observer* mObserverInstance = nullptr;
@@ -46,6 +74,7 @@ void _MacOSDistributedNotifications::Register(Application* client) {
     if (!mObserverInstance && !Setup()) {
         return;
     }
+    mObserverInstance->FollowDesktopScheme();
     dispatchTo.push_back(client);
 }
 

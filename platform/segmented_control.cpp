@@ -1,8 +1,11 @@
 // SegmentedControl over a row of checkable buttons that touch each other.
 #include "platform/segmented_control.h"
 
+#include <QKeyEvent>
 #include <QPushButton>
 #include <QWidget>
+
+#include <functional>
 
 #include "platform/application.h"
 
@@ -12,8 +15,36 @@ constexpr const char* kSegmentStyle =
     " color: palette(button-text); padding: 2px; }"
     "QPushButton:checked { background: palette(highlight); color: palette(highlighted-text); }"
     "QPushButton#first { border-top-left-radius: 5px; border-bottom-left-radius: 5px; }"
-    "QPushButton#last { border-top-right-radius: 5px; border-bottom-right-radius: 5px; }";
-}
+    "QPushButton#last { border-top-right-radius: 5px; border-bottom-right-radius: 5px; }"
+    "QPushButton:focus { border: 2px solid palette(highlight); }"
+    "QPushButton:focus:checked { border: 2px solid palette(highlighted-text); }";
+
+// A segment takes the focus by Tab or a click; the arrow keys choose its neighbour.
+class SegmentButton : public QPushButton {
+  public:
+    SegmentButton(const QString& title, QWidget* parent, std::function<void(int)> step)
+        : QPushButton(title, parent), step_(std::move(step)) {}
+
+  protected:
+    void keyPressEvent(QKeyEvent* event) override {
+        switch (event->key()) {
+            case Qt::Key_Left:
+            case Qt::Key_Up:
+                step_(-1);
+                break;
+            case Qt::Key_Right:
+            case Qt::Key_Down:
+                step_(1);
+                break;
+            default:
+                QPushButton::keyPressEvent(event);
+        }
+    }
+
+  private:
+    std::function<void(int)> step_;
+};
+}  // namespace
 
 void SegmentedControlItem::SetTitle(const std::string& title) {
     title_ = title;
@@ -80,15 +111,17 @@ void SegmentedControl::Rebuild() {
     qDeleteAll(row.findChildren<QPushButton*>(Qt::FindDirectChildrenOnly));
     int x = 0;
     for (size_t i = 0; i < items_.size(); ++i) {
-        auto* button = new QPushButton(QString::fromStdString(items_[i]->title_), &row);
+        const int index = static_cast<int>(i);
+        auto* button = new SegmentButton(QString::fromStdString(items_[i]->title_), &row,
+                                         [this, index](int step) { Step(index + step); });
         button->setObjectName(i == 0 ? "first" : i + 1 == items_.size() ? "last" : "middle");
         button->setCheckable(true);
-        button->setFocusPolicy(Qt::NoFocus);
+        button->setFocusPolicy(Qt::StrongFocus);
         button->setGeometry(x, 0, static_cast<int>(items_[i]->width_), Height());
         button->show();
         x += static_cast<int>(items_[i]->width_);
         QObject::connect(button, &QPushButton::clicked, Context(),
-                         [this, index = static_cast<int>(i)] { Clicked(index); });
+                         [this, index] { Clicked(index); });
     }
     ShowSelection();
 }
@@ -97,6 +130,16 @@ void SegmentedControl::ShowSelection() {
     const auto buttons = LiveWidget().findChildren<QPushButton*>(Qt::FindDirectChildrenOnly);
     for (int i = 0; i < buttons.size() && i < static_cast<int>(items_.size()); ++i) {
         buttons[i]->setChecked(items_[static_cast<size_t>(i)]->selected_);
+    }
+}
+
+// An arrow key moves the focus to the neighbouring segment and chooses it, as a click would;
+// there is no neighbour beyond the ends.
+void SegmentedControl::Step(int index) {
+    const auto buttons = LiveWidget().findChildren<QPushButton*>(Qt::FindDirectChildrenOnly);
+    if (index >= 0 && index < buttons.size()) {
+        buttons[index]->setFocus(Qt::TabFocusReason);
+        buttons[index]->click();
     }
 }
 

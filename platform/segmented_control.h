@@ -53,6 +53,7 @@ class SegmentedControl : public Control {
     friend class SegmentedControlItem;
     void Rebuild();
     void ShowSelection();
+    void Step(int index);
     void Clicked(int index);
 
     std::vector<Ref<SegmentedControlItem>> items_;

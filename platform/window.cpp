@@ -10,6 +10,7 @@
 #include <algorithm>
 
 #include "platform/application.h"
+#include "platform/focus_order.h"
 #include "platform/menu.h"
 #include "platform/native_window.h"
 #include "platform/qt_color.h"
@@ -23,6 +24,11 @@ void NativeWindow::closeEvent(QCloseEvent* event) {
     if (auto owner = owner_.lock()) {
         owner->NativeClosed();
     }
+}
+
+bool ClientArea::focusNextPrevChild(bool next) {
+    const auto owner = owner_.lock();
+    return owner && MoveFocus(owner->Controls(), next);
 }
 
 Window::Window(std::string className) : className_(std::move(className)) {}
@@ -41,7 +47,7 @@ Window::~Window() {
 void Window::Constructor() {
     native_ = new NativeWindow(weak_from_this());
     native_->setAttribute(Qt::WA_DeleteOnClose, false);
-    client_ = new QWidget;
+    client_ = new ClientArea(weak_from_this());
     client_->setAutoFillBackground(true);
     native_->setCentralWidget(client_);
     native_->layout()->setSizeConstraint(QLayout::SetFixedSize);

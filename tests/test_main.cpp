@@ -7,6 +7,9 @@ int main(int argc, char** argv) {
     if (qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM")) {
         qputenv("QT_QPA_PLATFORM", "offscreen");
     }
+    // No test reaches the desktop's session bus, whose portal would choose the appearance; the
+    // portal's own tests put a private bus here.
+    qputenv("DBUS_SESSION_BUS_ADDRESS", "");
     QApplication app(argc, argv);
     QApplication::setQuitOnLastWindowClosed(false);
     ::testing::InitGoogleTest(&argc, argv);

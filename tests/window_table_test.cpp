@@ -91,14 +91,13 @@ TEST_F(WindowTableTest, TextsAndFontsAreAsBuilt) {
     EXPECT_EQ(window->TextArea1()->Widget()->font().family(), "Courier");
 }
 
-TEST_F(WindowTableTest, TheListHasItsFourHeadingsAndWidths) {
+// The widths, fitted to the list in their proportions, are the keyboard tests' affair.
+TEST_F(WindowTableTest, TheListHasItsFourHeadings) {
     auto* view = static_cast<QTableView*>(window->Listbox1()->Widget());
     const char* headings[] = {"Date - Time", "Document", "Read Value", "Grade"};
-    const int widths[] = {200, 325, 300, 50};
     ASSERT_EQ(view->model()->columnCount(), 4);
     for (int i = 0; i < 4; ++i) {
         EXPECT_EQ(view->model()->headerData(i, Qt::Horizontal).toString(), headings[i]);
-        EXPECT_EQ(view->columnWidth(i), widths[i]);
     }
     EXPECT_TRUE(view->horizontalHeader()->isVisible() || !view->isVisible());
     EXPECT_EQ(window->Listbox1()->ListIndex(), -1);
