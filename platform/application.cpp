@@ -7,6 +7,7 @@
 
 namespace {
 Ref<Application> theApplication;
+long long handlersEntered = 0;
 
 // The dispatch rule without an application object: as if it had no UnhandledException handler.
 void CallWithoutApplication(const std::function<void()>& function) {
@@ -71,6 +72,7 @@ void _RuntimeRegisterAppObject(Ref<Application> app) {
 }
 
 void RaiseEvent(const std::function<void()>& handler) {
+    ++handlersEntered;
     // A C++ exception must not cross Qt's event loop; one that is no RuntimeException,
     // which the run-time would raise again, ends here at the last resort instead.
     try {
@@ -84,6 +86,10 @@ void RaiseEvent(const std::function<void()>& handler) {
     } catch (const std::exception& e) {
         std::fprintf(stderr, "Unhandled std::exception: %s\n", e.what());
     }
+}
+
+long long HandlersEntered() {
+    return handlersEntered;
 }
 
 bool RaiseBooleanEvent(const std::function<bool()>& handler) {

@@ -54,3 +54,5 @@ void _RuntimeRegisterAppObject(Ref<Application> app);
 void RaiseEvent(const std::function<void()>& handler);
 // The same for an event with a Boolean result; an exception counts as False.
 bool RaiseBooleanEvent(const std::function<bool()>& handler);
+// How many handlers have been entered through the two calls above, for tests that count them.
+long long HandlersEntered();

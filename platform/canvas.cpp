@@ -3,10 +3,12 @@
 
 #include <QPaintEvent>
 #include <QPainter>
+#include <QTimer>
 #include <QWidget>
 
 #include "platform/application.h"
 #include "platform/qt_color.h"
+#include "platform/yield.h"
 
 namespace {
 class CanvasWidget : public QWidget {
@@ -17,6 +19,10 @@ class CanvasWidget : public QWidget {
   protected:
     void paintEvent(QPaintEvent* event) override {
         if (!owner_) {
+            return;
+        }
+        if (YieldIsPainting()) {
+            PaintLater();
             return;
         }
         QPainter painter(this);
@@ -30,7 +36,20 @@ class CanvasWidget : public QWidget {
     }
 
   private:
+    // The Paint event runs the application's code, which must not run inside a handler that
+    // gave way: the area shows the ground beneath until the event loop is free again.
+    void PaintLater() {
+        if (!paintPending_) {
+            paintPending_ = true;
+            QTimer::singleShot(0, this, [this] {
+                paintPending_ = false;
+                update();
+            });
+        }
+    }
+
     Canvas* owner_;
+    bool paintPending_ = false;
 };
 }  // namespace
 

@@ -1,4 +1,4 @@
-// Exception helpers of the run-time: the global helper, the last resort, yield and stack check.
+// Exception helpers of the run-time: the global helper, the last resort and the stack check.
 #include "platform/exceptions.h"
 
 #include <cstdio>
@@ -17,9 +17,6 @@ void _UnhandledException(const RuntimeException& exception) {
     std::fprintf(stderr, "Unhandled %s\n", exception.ClassName().c_str());
     std::fflush(stderr);
 }
-
-// There is no other thread of the run-time to give way to, so the yield has nothing to do.
-void RuntimeBackgroundTask() {}
 
 namespace {
 int depth = 0;

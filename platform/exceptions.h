@@ -65,7 +65,8 @@ std::shared_ptr<RuntimeException> _CallFunctionWithExceptionHandling(
 // exception's class on stderr, and the program goes on.
 void _UnhandledException(const RuntimeException& exception);
 
-// The cooperative yield at the end of each pass of a long loop.
+// The cooperative yield at the end of each pass of a long loop. It keeps the window drawn and
+// runs nothing else: no input, timer or posted call (see platform/yield.h).
 void RuntimeBackgroundTask();
 
 // Entry check of a recursive function: counts nesting and raises StackOverflowException

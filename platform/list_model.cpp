@@ -88,6 +88,33 @@ void ListModel::Flush() {
     }
 }
 
+// With a sort order chosen, the first screen waits for the sort: the rows come on screen once,
+// sorted, when the load is over. Rows shown unsorted and then put in order would jump under
+// the user's eyes, and sorting at every paint would cost a long load dearly.
+bool ListModel::ShowRowsWhileLoading() {
+    if (sortColumn_ >= 0 || static_cast<int>(store_.Count()) <= shown_) {
+        return false;
+    }
+    Flush();
+    return true;
+}
+
+void ShowRowsAddedSoFar(QTableView& view) {
+    auto* model = dynamic_cast<ListModel*>(view.model());
+    if (!model) {
+        return;
+    }
+    const int before = model->rowCount();
+    if (!model->ShowRowsWhileLoading()) {
+        return;
+    }
+    // Rows that come into the viewport need the layout and a paint. Rows below it change only
+    // the scroll bar, whose update would repaint the whole viewport: it waits for the end.
+    if (view.rowViewportPosition(before) < view.viewport()->height()) {
+        view.doItemsLayout();
+    }
+}
+
 // Persistent indexes, the selection among them, follow their rows to the new places.
 void ListModel::ApplySort() {
     if (sortColumn_ < 0 || sortColumn_ >= Columns()) {

@@ -4,6 +4,7 @@
 
 #include <QAbstractTableModel>
 #include <QStringList>
+#include <QTableView>
 
 #include "platform/row_store.h"
 
@@ -31,6 +32,9 @@ class ListModel : public QAbstractTableModel {
     void CellChanged(size_t row, int column);
     // Shows the rows added so far, sorted if a sort order was chosen.
     void Flush();
+    // The cooperative yield's part: shows the rows added so far if no sort order was chosen.
+    // True if the view got rows.
+    bool ShowRowsWhileLoading();
 
   private:
     void ApplySort();
@@ -43,3 +47,7 @@ class ListModel : public QAbstractTableModel {
     int sortColumn_ = -1;
     Qt::SortOrder sortOrder_ = Qt::AscendingOrder;
 };
+
+// Lets a view over a ListModel show the rows added so far, from inside the cooperative yield,
+// where its timers don't run: it is laid out at once.
+void ShowRowsAddedSoFar(QTableView& view);

@@ -2,7 +2,9 @@
 #include "platform/runtime.h"
 
 #include <QApplication>
+#include <QElapsedTimer>
 #include <QTimer>
+#include <QWidget>
 
 #include "platform/application.h"
 #include "platform/window.h"
@@ -15,6 +17,30 @@ int exitStatus = 0;
 std::unique_ptr<QApplication> ownApplication;
 
 int argcKept = 0;
+
+constexpr qint64 kOpenWaitLimitMs = 500;
+
+bool WindowsOnScreen() {
+    for (QWidget* window : QApplication::topLevelWidgets()) {
+        if (window->isVisible() && !window->testAttribute(Qt::WA_Mapped)) {
+            return false;
+        }
+    }
+    return true;
+}
+
+// The application's Open brings the user to the first page, whose load may be long. It waits
+// until the windows are on screen, half a second at most, so that the yield of that load has
+// a window to paint the rows on as they come.
+void RaiseOpenOnceShown(QElapsedTimer waiting) {
+    if (!WindowsOnScreen() && !waiting.hasExpired(kOpenWaitLimitMs)) {
+        QTimer::singleShot(1, QApplication::instance(), [waiting] { RaiseOpenOnceShown(waiting); });
+        return;
+    }
+    if (auto app = CurrentApplication()) {
+        RaiseEvent([app] { app->Event_Open(); });
+    }
+}
 }  // namespace
 
 void RuntimeInit(int argc, char** argv) {
@@ -73,9 +99,9 @@ void _RuntimeRun() {
         } else if (lateStartup) {
             RaiseEvent(lateStartup);
         }
-        if (auto app = CurrentApplication()) {
-            RaiseEvent([app] { app->Event_Open(); });
-        }
+        QElapsedTimer waiting;
+        waiting.start();
+        RaiseOpenOnceShown(waiting);
     });
     exitStatus = QApplication::exec();
 }

@@ -1,0 +1,19 @@
+// The cooperative yield's painting: what the controls ask of it, and seams for tests and
+// benchmarks.
+#pragma once
+
+#include <chrono>
+#include <functional>
+
+// True while the yield paints. A control whose paint would run the application's own code
+// leaves it for later then: the handler that gave way is still running.
+bool YieldIsPainting();
+
+// The clock that the throttle reads; nullptr for the real one.
+using YieldClock = std::chrono::nanoseconds (*)();
+void SetYieldClockForTesting(YieldClock clock);
+// The least time between two painting yields: 50 ms unless set. Zero paints at every yield;
+// nanoseconds::max() never paints, so that the yield does nothing at all.
+void SetYieldIntervalForTesting(std::chrono::nanoseconds interval);
+// Called at the end of each yield that painted, while input is still held back.
+void SetYieldPaintObserverForTesting(std::function<void()> observer);
