@@ -90,6 +90,8 @@ void RectBox::SetProperty(const std::string& name, const PropertyValue& value) {
         linesize = std::get<long long>(value);
     } else if (name == "title") {
         title = std::get<std::string>(value);
+        // A screen reader names the frame by its title.
+        SetAccessibleName(title);
     }
 }
 

@@ -66,6 +66,10 @@ void Control::PropertiesApplied() {
     }
 }
 
+void Control::SetAccessibleName(const std::string& name) {
+    LiveWidget().setAccessibleName(QString::fromStdString(name));
+}
+
 Ref<::Window> Control::Window() const {
     return Ref<::Window>(window_.lock());
 }

@@ -32,6 +32,9 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     long long TabPanelIndex() const { return tabPanelIndex_; }
     Ref<::Window> Window() const;
 
+    // What a screen reader calls the control, where the widget has no text of its own to offer.
+    void SetAccessibleName(const std::string& name);
+
     // Whether the control can be seen: visible itself, on the page its container shows.
     bool IsShown() const;
     // Containers whose pages hide and show the controls that lie on them.

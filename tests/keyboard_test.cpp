@@ -12,6 +12,7 @@
 #include <QScrollBar>
 #include <QToolTip>
 
+#include "drawing/rect_box.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -235,13 +236,17 @@ TEST_F(KeyboardTest, ACutCellShowsItsWholeTextInATooltip) {
         << "a grade that fits has no tooltip";
 }
 
-TEST_F(KeyboardTest, TheListAndTheSegmentsHaveAccessibleNames) {
+TEST_F(KeyboardTest, TheListTheFramesTheSegmentsAndTheButtonsHaveAccessibleNames) {
     auto window = StartUp();
-    EXPECT_EQ(View(window).accessibleName(), "Date - Time, Document, Read Value, Grade");
+    auto name = [](QWidget* widget) {
+        return QAccessible::queryAccessibleInterface(widget)->text(QAccessible::Name);
+    };
+    EXPECT_EQ(name(&View(window)), "Date - Time, Document, Read Value, Grade");
+    EXPECT_EQ(name(window->Canvas2()->Widget()), "Verification Results");
+    EXPECT_EQ(name(window->PushButton1()->Widget()), "Install Now");
     const auto segments = window->MainTabs()->Widget()->findChildren<QPushButton*>();
     ASSERT_EQ(segments.size(), 2);
-    EXPECT_EQ(QAccessible::queryAccessibleInterface(segments[1])->text(QAccessible::Name),
-              "Verification Results");
+    EXPECT_EQ(name(segments[1]), "Verification Results");
 }
 
 }  // namespace
