@@ -26,7 +26,7 @@ mkdir -p docs
 menu=19
 shot() {
   sleep 1
-  xwd -id "$window" -silent | convert xwd:- "docs/$1.png"
+  xwd -id "$window" -silent | convert xwd:- -define png:exclude-chunk=date,time "docs/$1.png"
   echo "docs/$1.png"
 }
 shot list
