@@ -3,14 +3,19 @@
 // file: the floor, a loop in this process that prepares the list query and asks SQLite for the
 // text of every column of every row, and `sqlite3 FILE "select * from results_store"`. It
 // reports the peak memory of a load against the bytes of the shown columns, the time for the
-// rows to reach the view, and the double-click open.
+// rows to reach the view, and the double-click open. Loads with the painting yield alternate
+// with loads whose yield is empty: it prints when the first rows were painted after the arrival
+// on the list page, how often the window was brought up to date during the load and during a
+// copy of a 2,000-file tree, and the painting load against the empty one.
 //
 //   bench_list_load [RUNS] [FOLDER] [COUNT]  (stores are made in FOLDER once and kept; with
 //                                             COUNT, one store of COUNT invented results only)
-//   bench_list_load --load ROOT              (one measured load in this process; used by the
+//   bench_list_load --load ROOT [empty]      (one measured load in this process; used by the
 //                                             above)
 #include <QApplication>
 #include <QElapsedTimer>
+
+#include <unistd.h>
 
 #include <sqlite3.h>
 
@@ -21,7 +26,9 @@
 #include <string>
 #include <vector>
 
+#include "installer/copy.h"
 #include "platform/runtime.h"
+#include "platform/yield.h"
 #include "scripts/demo_tree.h"
 #include "shell/startup.h"
 #include "shell/window1.h"
@@ -42,18 +49,64 @@ long StatusKilobytes(const char* key) {
     return 0;
 }
 
-// One load in a fresh process: prints "load flush peak shown open" (ms, ms, bytes, bytes, ms).
-int MeasureOneLoad(int argc, char** argv, const char* root) {
+constexpr int kCopyFiles = 2000;
+
+// The copy's source: 20 folders of 100 files of 10 KB, made once beside the store.
+fs::path CopySource(const fs::path& root) {
+    const fs::path source = root / "copy-source" / "Ostrelin.acroplugin";
+    if (!fs::exists(source)) {
+        const std::string bytes(10 * 1024, 'p');
+        for (int i = 0; i < kCopyFiles; ++i) {
+            const fs::path folder = source / ("group" + std::to_string(i / 100));
+            fs::create_directories(folder);
+            std::ofstream(folder / ("file" + std::to_string(i) + ".bin"), std::ios::binary)
+                << bytes;
+        }
+    }
+    return source;
+}
+
+// The copy with the window on screen: its time and the yields that painted.
+std::pair<double, int> MeasureCopy(const fs::path& root, int& paints) {
+    const fs::path target = root / ("copy-target-" + std::to_string(getpid()));
+    fs::create_directories(target);
+    const fs::path source = CopySource(root);
+    const int before = paints;
+    const double milliseconds = Milliseconds([&] {
+        CopyFileOrFolder(GetFolderItem(source.string(), 3), GetFolderItem(target.string(), 3));
+    });
+    fs::remove_all(target);
+    return {milliseconds, paints - before};
+}
+
+// One load in a fresh process: prints "load flush peak shown open rows firstRows loadPaints
+// copy copyPaints" (ms, ms, bytes, bytes, ms, count, ms, count, ms, count).
+int MeasureOneLoad(int argc, char** argv, const char* root, bool emptyYield) {
     setenv("ORBELANE_ROOT", root, 1);
     RuntimeInit(argc, argv);
     _EarlyStartup();
     auto window = Window1();
     QCoreApplication::processEvents();
-    const long baseline = StatusKilobytes("VmRSS");
+    if (emptyYield) {
+        SetYieldIntervalForTesting(std::chrono::nanoseconds::max());
+    }
     QElapsedTimer timer;
+    double firstRows = -1;
+    int paints = 0;
+    SetYieldPaintObserverForTesting([&paints] { ++paints; });
+    auto cellPaint = window->Listbox1()->CellBackgroundPaint;
+    window->Listbox1()->CellBackgroundPaint = [&](Listbox& list, Ref<Graphics> g, long long row,
+                                                  long long column) {
+        if (firstRows < 0 && YieldIsPainting()) {
+            firstRows = timer.nsecsElapsed() / 1e6;
+        }
+        return cellPaint(list, g, row, column);
+    };
+    const long baseline = StatusKilobytes("VmRSS");
     timer.start();
     window->PagePanel1()->SetValue(1);
     const double load = timer.nsecsElapsed() / 1e6;
+    const int loadPaints = paints;
     timer.restart();
     QCoreApplication::processEvents();  // the rows reach the view
     const double flush = timer.nsecsElapsed() / 1e6;
@@ -74,8 +127,9 @@ int MeasureOneLoad(int argc, char** argv, const char* root) {
         opens.push_back(timer.nsecsElapsed() / 1e6);
         window->PagePanel1()->SetValue(0);
     }
-    std::printf("%.2f %.2f %ld %zu %.3f %lld\n", load, flush, peak * 1024, shown, Median(opens),
-                list->ListCount());
+    const auto [copy, copyPaints] = MeasureCopy(root, paints);
+    std::printf("%.2f %.2f %ld %zu %.3f %lld %.2f %d %.2f %d\n", load, flush, peak * 1024, shown,
+                Median(opens), list->ListCount(), firstRows, loadPaints, copy, copyPaints);
     std::fflush(stdout);
     std::_Exit(0);
 }
@@ -105,6 +159,28 @@ double FloorMilliseconds(const fs::path& store) {
     return milliseconds;
 }
 
+struct ChildLoad {
+    double load = 0, flush = 0, open = 0, firstRows = 0, copy = 0;
+    int loadPaints = 0, copyPaints = 0;
+};
+
+ChildLoad RunChildLoad(const std::string& self, const fs::path& root, size_t count, bool emptyYield,
+                       double& peak, double& shown) {
+    const std::string command = "QT_QPA_PLATFORM=offscreen '" + self + "' --load '" +
+                                root.string() + "'" + (emptyYield ? " empty" : "") + " 2>/dev/null";
+    FILE* child = popen(command.c_str(), "r");
+    ChildLoad result;
+    long long rows = 0;
+    if (std::fscanf(child, "%lf %lf %lf %lf %lf %lld %lf %d %lf %d", &result.load, &result.flush,
+                    &peak, &shown, &result.open, &rows, &result.firstRows, &result.loadPaints,
+                    &result.copy, &result.copyPaints) != 10 ||
+        rows != static_cast<long long>(count)) {
+        std::fprintf(stderr, "the load did not report\n");
+    }
+    pclose(child);
+    return result;
+}
+
 struct Shape {
     const char* name;
     size_t count;
@@ -122,22 +198,20 @@ void MeasureStore(const fs::path& folder, const Shape& shape, int runs) {
         demo::WriteInventedStore(store, shape.count, shape.bars);
     }
     std::vector<double> loads, floors, cli, flushes, opens;
+    std::vector<double> emptyLoads, firstRows, loadRates, copyRates, copies, emptyCopies;
     double peak = 0, shown = 0;
     for (int i = 0; i < runs; ++i) {
-        const std::string command =
-            "QT_QPA_PLATFORM=offscreen '" + self + "' --load '" + root.string() + "' 2>/dev/null";
-        FILE* child = popen(command.c_str(), "r");
-        double load = 0, flush = 0, open = 0;
-        long long rows = 0;
-        if (std::fscanf(child, "%lf %lf %lf %lf %lf %lld", &load, &flush, &peak, &shown, &open,
-                        &rows) != 6 ||
-            rows != static_cast<long long>(shape.count)) {
-            std::fprintf(stderr, "the load did not report\n");
-        }
-        pclose(child);
-        loads.push_back(load);
-        flushes.push_back(flush);
-        opens.push_back(open);
+        const ChildLoad painting = RunChildLoad(self, root, shape.count, false, peak, shown);
+        const ChildLoad empty = RunChildLoad(self, root, shape.count, true, peak, shown);
+        loads.push_back(painting.load);
+        flushes.push_back(painting.flush);
+        opens.push_back(painting.open);
+        emptyLoads.push_back(empty.load);
+        firstRows.push_back(painting.firstRows);
+        loadRates.push_back(painting.loadPaints * 1000.0 / painting.load);
+        copyRates.push_back(painting.copyPaints * 1000.0 / painting.copy);
+        copies.push_back(painting.copy);
+        emptyCopies.push_back(empty.copy);
         floors.push_back(FloorMilliseconds(store));
         cli.push_back(TimeCommand("sqlite3 '" + store.string() +
                                   "' \"select * from results_store\" > /dev/null"));
@@ -158,6 +232,18 @@ void MeasureStore(const fs::path& folder, const Shape& shape, int runs) {
                 peak / 1e6, shown / 1e6, peak / shown, million ? " (target <= 1.5x)" : "");
     std::printf("  double-click report open, median of 21 rows: %.2f ms%s\n", Median(opens),
                 million ? " (target <= 50 ms)" : "");
+    const double e = Median(emptyLoads);
+    std::printf(
+        "  painting yield: first rows painted %.1f ms after the arrival (target <= 100 ms)\n",
+        Median(firstRows));
+    std::printf(
+        "  window brought up to date %.1f times a second during the load, %.1f during a copy of "
+        "%d files (target >= 10)\n",
+        Median(loadRates), Median(copyRates), kCopyFiles);
+    std::printf(
+        "  load %.0f ms against %.0f ms with an empty yield: ratio %.3f (target <= 1.05); copy "
+        "%.0f ms against %.0f ms: ratio %.2f\n",
+        l, e, l / e, Median(copies), Median(emptyCopies), Median(copies) / Median(emptyCopies));
     std::fflush(stdout);
 }
 
@@ -165,7 +251,7 @@ void MeasureStore(const fs::path& folder, const Shape& shape, int runs) {
 
 int main(int argc, char** argv) {
     if (argc > 2 && std::string(argv[1]) == "--load") {
-        return MeasureOneLoad(argc, argv, argv[2]);
+        return MeasureOneLoad(argc, argv, argv[2], argc > 3 && std::string(argv[3]) == "empty");
     }
     const int runs = argc > 1 ? std::atoi(argv[1]) : 5;
     const fs::path folder =

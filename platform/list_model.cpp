@@ -104,13 +104,15 @@ void ShowRowsAddedSoFar(QTableView& view) {
     if (!model) {
         return;
     }
-    const int before = model->rowCount();
-    if (!model->ShowRowsWhileLoading()) {
+    // Once the viewport is full, rows below it would change nothing but the scroll bar, whose
+    // update repaints the whole viewport, and each insertion costs the view time in proportion
+    // to all its rows: the rest reach the view in one insertion when the load is over.
+    const int shown = model->rowCount();
+    if (shown > 0 && view.rowViewportPosition(shown - 1) + view.rowHeight(shown - 1) >=
+                         view.viewport()->height()) {
         return;
     }
-    // Rows that come into the viewport need the layout and a paint. Rows below it change only
-    // the scroll bar, whose update would repaint the whole viewport: it waits for the end.
-    if (view.rowViewportPosition(before) < view.viewport()->height()) {
+    if (model->ShowRowsWhileLoading()) {
         view.doItemsLayout();
     }
 }

@@ -75,6 +75,9 @@ void PaintWhatIsDue() {
 }  // namespace
 
 void RuntimeBackgroundTask() {
+    if (interval == std::chrono::nanoseconds::max()) {
+        return;
+    }
     const std::chrono::nanoseconds now = readClock();
     if (painting || now - lastPaint < interval) {
         return;

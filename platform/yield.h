@@ -13,7 +13,7 @@ bool YieldIsPainting();
 using YieldClock = std::chrono::nanoseconds (*)();
 void SetYieldClockForTesting(YieldClock clock);
 // The least time between two painting yields: 50 ms unless set. Zero paints at every yield;
-// nanoseconds::max() never paints, so that the yield does nothing at all.
+// nanoseconds::max() makes the yield an empty one that does not even read the clock.
 void SetYieldIntervalForTesting(std::chrono::nanoseconds interval);
 // Called at the end of each yield that painted, while input is still held back.
 void SetYieldPaintObserverForTesting(std::function<void()> observer);

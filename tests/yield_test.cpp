@@ -4,6 +4,7 @@
 #include <QMouseEvent>
 #include <QPushButton>
 
+#include "installer/copy.h"
 #include "platform/yield.h"
 #include "window_fixture.h"
 
@@ -171,6 +172,27 @@ TEST_F(YieldTest, NoHandlerButTheCellPaintIsEnteredInsideTheYield) {
     const long long afterLoad = HandlersEntered();
     ProcessEvents();
     EXPECT_GT(HandlersEntered(), afterLoad) << "the frame is painted once the loop is free";
+}
+
+TEST_F(YieldTest, TheCopyPaintsAtEachPassAndEntersNoHandler) {
+    Store(Results(kRows));
+    auto window = StartUp();
+    const auto source = tree.Path() / "Ostrelin.acroplugin";
+    for (int folder = 0; folder < 3; ++folder) {
+        for (int file = 0; file < 5; ++file) {
+            WriteFile(source / std::to_string(folder) / std::to_string(file), "plug-in");
+        }
+    }
+    std::filesystem::create_directories(tree.Path() / "Plug-ins");
+    SetYieldIntervalForTesting(std::chrono::nanoseconds(0));
+    int paints = 0;
+    SetYieldPaintObserverForTesting([&] { ++paints; });
+    const long long before = HandlersEntered();
+    CopyFileOrFolder(GetFolderItem(source.string(), 3),
+                     GetFolderItem((tree.Path() / "Plug-ins").string(), 3));
+    EXPECT_EQ(paints, 3 + 3 * 5) << "one yield per child of every folder";
+    EXPECT_EQ(HandlersEntered(), before);
+    EXPECT_EQ(ReadFile(tree.Path() / "Plug-ins" / "Ostrelin.acroplugin" / "2" / "4"), "plug-in");
 }
 
 // A clock that moves 10 ms at each reading.
