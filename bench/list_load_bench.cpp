@@ -80,7 +80,7 @@ std::pair<double, int> MeasureCopy(const fs::path& root, int& paints) {
 }
 
 // One load in a fresh process: prints "load flush peak shown open rows firstRows loadPaints
-// copy copyPaints" (ms, ms, bytes, bytes, ms, count, ms, count, ms, count).
+// copy copyPaints painting" (ms, ms, bytes, bytes, ms, count, ms, count, ms, count, ms).
 int MeasureOneLoad(int argc, char** argv, const char* root, bool emptyYield) {
     setenv("ORBELANE_ROOT", root, 1);
     RuntimeInit(argc, argv);
@@ -93,7 +93,11 @@ int MeasureOneLoad(int argc, char** argv, const char* root, bool emptyYield) {
     QElapsedTimer timer;
     double firstRows = -1;
     int paints = 0;
-    SetYieldPaintObserverForTesting([&paints] { ++paints; });
+    double painting = 0;  // ms inside the yields that painted, during the load
+    SetYieldPaintObserverForTesting([&](std::chrono::nanoseconds spent) {
+        ++paints;
+        painting += std::chrono::duration<double, std::milli>(spent).count();
+    });
     auto cellPaint = window->Listbox1()->CellBackgroundPaint;
     window->Listbox1()->CellBackgroundPaint = [&](Listbox& list, Ref<Graphics> g, long long row,
                                                   long long column) {
@@ -107,6 +111,7 @@ int MeasureOneLoad(int argc, char** argv, const char* root, bool emptyYield) {
     window->PagePanel1()->SetValue(1);
     const double load = timer.nsecsElapsed() / 1e6;
     const int loadPaints = paints;
+    const double loadPainting = painting;
     timer.restart();
     QCoreApplication::processEvents();  // the rows reach the view
     const double flush = timer.nsecsElapsed() / 1e6;
@@ -128,8 +133,9 @@ int MeasureOneLoad(int argc, char** argv, const char* root, bool emptyYield) {
         window->PagePanel1()->SetValue(0);
     }
     const auto [copy, copyPaints] = MeasureCopy(root, paints);
-    std::printf("%.2f %.2f %ld %zu %.3f %lld %.2f %d %.2f %d\n", load, flush, peak * 1024, shown,
-                Median(opens), list->ListCount(), firstRows, loadPaints, copy, copyPaints);
+    std::printf("%.2f %.2f %ld %zu %.3f %lld %.2f %d %.2f %d %.2f\n", load, flush, peak * 1024,
+                shown, Median(opens), list->ListCount(), firstRows, loadPaints, copy, copyPaints,
+                loadPainting);
     std::fflush(stdout);
     std::_Exit(0);
 }
@@ -160,7 +166,7 @@ double FloorMilliseconds(const fs::path& store) {
 }
 
 struct ChildLoad {
-    double load = 0, flush = 0, open = 0, firstRows = 0, copy = 0;
+    double load = 0, flush = 0, open = 0, firstRows = 0, copy = 0, painting = 0;
     int loadPaints = 0, copyPaints = 0;
 };
 
@@ -171,9 +177,9 @@ ChildLoad RunChildLoad(const std::string& self, const fs::path& root, size_t cou
     FILE* child = popen(command.c_str(), "r");
     ChildLoad result;
     long long rows = 0;
-    if (std::fscanf(child, "%lf %lf %lf %lf %lf %lld %lf %d %lf %d", &result.load, &result.flush,
-                    &peak, &shown, &result.open, &rows, &result.firstRows, &result.loadPaints,
-                    &result.copy, &result.copyPaints) != 10 ||
+    if (std::fscanf(child, "%lf %lf %lf %lf %lf %lld %lf %d %lf %d %lf", &result.load,
+                    &result.flush, &peak, &shown, &result.open, &rows, &result.firstRows,
+                    &result.loadPaints, &result.copy, &result.copyPaints, &result.painting) != 11 ||
         rows != static_cast<long long>(count)) {
         std::fprintf(stderr, "the load did not report\n");
     }
@@ -199,6 +205,7 @@ void MeasureStore(const fs::path& folder, const Shape& shape, int runs) {
     }
     std::vector<double> loads, floors, cli, flushes, opens;
     std::vector<double> emptyLoads, firstRows, loadRates, copyRates, copies, emptyCopies;
+    std::vector<double> paintShares;
     double peak = 0, shown = 0;
     for (int i = 0; i < runs; ++i) {
         const ChildLoad painting = RunChildLoad(self, root, shape.count, false, peak, shown);
@@ -211,6 +218,7 @@ void MeasureStore(const fs::path& folder, const Shape& shape, int runs) {
         loadRates.push_back(painting.loadPaints * 1000.0 / painting.load);
         copyRates.push_back(painting.copyPaints * 1000.0 / painting.copy);
         copies.push_back(painting.copy);
+        paintShares.push_back(painting.painting / painting.load);
         emptyCopies.push_back(empty.copy);
         floors.push_back(FloorMilliseconds(store));
         cli.push_back(TimeCommand("sqlite3 '" + store.string() +
@@ -244,6 +252,8 @@ void MeasureStore(const fs::path& folder, const Shape& shape, int runs) {
         "  load %.0f ms against %.0f ms with an empty yield: ratio %.3f (target <= 1.05); copy "
         "%.0f ms against %.0f ms: ratio %.2f\n",
         l, e, l / e, Median(copies), Median(emptyCopies), Median(copies) / Median(emptyCopies));
+    std::printf("  painting took %.1f%% of the load, measured inside the yield\n",
+                100 * Median(paintShares));
     std::fflush(stdout);
 }
 

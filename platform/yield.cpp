@@ -36,7 +36,7 @@ std::chrono::nanoseconds CoarseNow() {
 YieldClock readClock = &CoarseNow;
 std::chrono::nanoseconds interval = kPaintInterval;
 std::chrono::nanoseconds lastPaint{0};
-std::function<void()> paintObserver;
+std::function<void(std::chrono::nanoseconds)> paintObserver;
 bool painting = false;
 
 // Paints the window's dirty areas now, through the same path as a queued update request, and
@@ -54,6 +54,7 @@ void PaintWindow(QWidget& window) {
 }
 
 void PaintWhatIsDue() {
+    const auto start = std::chrono::steady_clock::now();
     if (!qobject_cast<QApplication*>(QCoreApplication::instance())) {
         return;  // no windows without a widget application
     }
@@ -68,7 +69,7 @@ void PaintWhatIsDue() {
         }
     }
     if (paintObserver) {
-        paintObserver();
+        paintObserver(std::chrono::steady_clock::now() - start);
     }
 }
 
@@ -99,6 +100,6 @@ void SetYieldIntervalForTesting(std::chrono::nanoseconds testInterval) {
     interval = testInterval;
 }
 
-void SetYieldPaintObserverForTesting(std::function<void()> observer) {
+void SetYieldPaintObserverForTesting(std::function<void(std::chrono::nanoseconds)> observer) {
     paintObserver = std::move(observer);
 }

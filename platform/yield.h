@@ -15,5 +15,6 @@ void SetYieldClockForTesting(YieldClock clock);
 // The least time between two painting yields: 50 ms unless set. Zero paints at every yield;
 // nanoseconds::max() makes the yield an empty one that does not even read the clock.
 void SetYieldIntervalForTesting(std::chrono::nanoseconds interval);
-// Called at the end of each yield that painted, while input is still held back.
-void SetYieldPaintObserverForTesting(std::function<void()> observer);
+// Called at the end of each yield that painted, while input is still held back, with the time
+// that the painting took.
+void SetYieldPaintObserverForTesting(std::function<void(std::chrono::nanoseconds)> observer);

@@ -111,7 +111,7 @@ TEST_P(SameListTest, APaintingLoadLeavesTheSameListAsAnEmptyYield) {
 
     int paints = 0;
     SetYieldIntervalForTesting(std::chrono::nanoseconds(0));
-    SetYieldPaintObserverForTesting([&] { ++paints; });
+    SetYieldPaintObserverForTesting([&](auto) { ++paints; });
     Reload(window);
     EXPECT_EQ(paints, kRows) << "a zero interval paints at every yield";
     EXPECT_EQ(State(window), empty);
@@ -144,7 +144,8 @@ TEST_F(YieldTest, WithASortTheFirstScreenWaitsForTheSort) {
     window->Listbox1()->PressHeading(1);
     SetYieldIntervalForTesting(std::chrono::nanoseconds(0));
     std::vector<int> viewRows;
-    SetYieldPaintObserverForTesting([&] { viewRows.push_back(View(window).model()->rowCount()); });
+    SetYieldPaintObserverForTesting(
+        [&](auto) { viewRows.push_back(View(window).model()->rowCount()); });
     Reload(window);
     ASSERT_EQ(viewRows.size(), static_cast<size_t>(kRows));
     EXPECT_EQ(viewRows.back(), 0);
@@ -160,7 +161,7 @@ TEST_F(YieldTest, NoHandlerButTheCellPaintIsEnteredInsideTheYield) {
     CountCellPaints(window);
     SetYieldIntervalForTesting(std::chrono::nanoseconds(0));
     int paints = 0;
-    SetYieldPaintObserverForTesting([&] { ++paints; });
+    SetYieldPaintObserverForTesting([&](auto) { ++paints; });
     const long long before = HandlersEntered();
     // The list page comes with its frame, which needs painting inside the first yield.
     window->MainTabs()->Press(1);
@@ -186,7 +187,7 @@ TEST_F(YieldTest, TheCopyPaintsAtEachPassAndEntersNoHandler) {
     std::filesystem::create_directories(tree.Path() / "Plug-ins");
     SetYieldIntervalForTesting(std::chrono::nanoseconds(0));
     int paints = 0;
-    SetYieldPaintObserverForTesting([&] { ++paints; });
+    SetYieldPaintObserverForTesting([&](auto) { ++paints; });
     const long long before = HandlersEntered();
     CopyFileOrFolder(GetFolderItem(source.string(), 3),
                      GetFolderItem((tree.Path() / "Plug-ins").string(), 3));
@@ -207,7 +208,7 @@ TEST_F(YieldTest, TheYieldPaintsAtMostEveryFiftyMilliseconds) {
     auto window = StartUp();
     SetYieldClockForTesting(&TenMillisecondsAStep);
     int paints = 0;
-    SetYieldPaintObserverForTesting([&] { ++paints; });
+    SetYieldPaintObserverForTesting([&](auto) { ++paints; });
     window->PagePanel1()->SetValue(1);
     EXPECT_EQ(paints, kRows / 5);
 }
@@ -226,7 +227,7 @@ TEST_F(YieldTest, AClickQueuedDuringALoadActsAfterItOnce) {
     SetYieldIntervalForTesting(std::chrono::nanoseconds(0));
     int paints = 0;
     std::vector<long long> pagesSeen;
-    SetYieldPaintObserverForTesting([&] {
+    SetYieldPaintObserverForTesting([&](auto) {
         if (++paints == 2) {
             const QPointF centre = installation->rect().center();
             const QPointF global = installation->mapToGlobal(centre);
