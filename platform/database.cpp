@@ -27,7 +27,17 @@ bool IsBlankTail(sqlite3* db, const char* tail) {
     return true;
 }
 
+// A field that held a huge text gives its memory back rather than keep it for small ones.
+constexpr size_t kKeptCapacity = 1 << 16;
+
 }  // namespace
+
+void DatabaseField::Assign(const char* text, size_t bytes) {
+    if (value_.capacity() > kKeptCapacity && bytes <= kKeptCapacity) {
+        value_ = std::string();
+    }
+    value_.assign(text, bytes);
+}
 
 RecordSet::RecordSet(std::shared_ptr<sqlite3> connection, sqlite3_stmt* statement, bool atEnd)
     : connection_(std::move(connection)), statement_(statement), atEnd_(atEnd) {
@@ -36,13 +46,14 @@ RecordSet::RecordSet(std::shared_ptr<sqlite3> connection, sqlite3_stmt* statemen
         const char* name = sqlite3_column_name(statement_, i);
         columns_.emplace_back(name ? name : "");
     }
+    fields_.resize(columns_.size());
 }
 
 RecordSet::~RecordSet() {
     Close();
 }
 
-Ref<DatabaseField> RecordSet::Field(const std::string& name) const {
+Ref<DatabaseField> RecordSet::Field(std::string_view name) const {
     if (!statement_ || atEnd_) {
         return nullptr;
     }
@@ -65,8 +76,13 @@ Ref<DatabaseField> RecordSet::Field(const std::string& name) const {
         asked_.emplace_back(name, column);
     }
     const auto* text = reinterpret_cast<const char*>(sqlite3_column_text(statement_, column));
-    const int bytes = sqlite3_column_bytes(statement_, column);
-    return New<DatabaseField>(text ? std::string(text, static_cast<size_t>(bytes)) : std::string());
+    const auto bytes = text ? static_cast<size_t>(sqlite3_column_bytes(statement_, column)) : 0;
+    std::shared_ptr<DatabaseField>& field = fields_[static_cast<size_t>(column)];
+    if (!field || field.use_count() > 1) {
+        field = std::make_shared<DatabaseField>();  // the old one stays with its holder
+    }
+    field->Assign(text ? text : "", bytes);
+    return Ref<DatabaseField>(field);
 }
 
 // A failure while stepping ends the rows, as the end of the result would.
@@ -81,6 +97,7 @@ void RecordSet::Close() {
         sqlite3_finalize(statement_);
         statement_ = nullptr;
     }
+    fields_.clear();
     atEnd_ = true;
     connection_.reset();
 }
@@ -91,8 +108,10 @@ bool SQLiteDatabase::Connect() {
         return false;
     }
     sqlite3* db = nullptr;
-    const int opened =
-        sqlite3_open_v2(DatabaseFile->NativePath().c_str(), &db, SQLITE_OPEN_READONLY, nullptr);
+    // A connection lives inside one handler on the one thread, so SQLite's own lock on every
+    // call would be pure cost.
+    const int opened = sqlite3_open_v2(DatabaseFile->NativePath().c_str(), &db,
+                                       SQLITE_OPEN_READONLY | SQLITE_OPEN_NOMUTEX, nullptr);
     std::shared_ptr<sqlite3> connection(db, sqlite3_close_v2);
     if (opened != SQLITE_OK) {
         return false;

@@ -5,6 +5,7 @@
 
 #include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "platform/folder_item.h"
@@ -15,10 +16,14 @@ struct sqlite3_stmt;
 
 class DatabaseField {
   public:
+    DatabaseField() = default;
     explicit DatabaseField(std::string value) : value_(std::move(value)) {}
     // The column's value as text; a NULL is the empty text.
     std::string StringValue() const { return value_; }
     operator const std::string&() const { return value_; }
+
+    // Platform use: the record set refills a field that nobody holds any more.
+    void Assign(const char* text, size_t bytes);
 
   private:
     std::string value_;
@@ -34,7 +39,7 @@ class RecordSet {
     // EOF of the platform (EOF itself is a macro of the C library): true behind the last row.
     bool Eof() const { return atEnd_; }
     // The column of the current row, found by name, case aside; Nil for no such column.
-    Ref<DatabaseField> Field(const std::string& name) const;
+    Ref<DatabaseField> Field(std::string_view name) const;
     void MoveNext();
     void Close();
 
@@ -45,6 +50,9 @@ class RecordSet {
     std::vector<std::string> columns_;
     // Names asked before, exactly as asked, with their column: a loop asks the same few.
     mutable std::vector<std::pair<std::string, int>> asked_;
+    // One field object for each column, handed out again once its last holder has let go, so
+    // a loop over a million rows allocates nothing per field.
+    mutable std::vector<std::shared_ptr<DatabaseField>> fields_;
 };
 
 class SQLiteDatabase {

@@ -1,4 +1,5 @@
-// Packed rows: a record is, for each field, a varint length and the bytes.
+// Packed rows: a record is, for each field, a varint length and the bytes. A location is the
+// chunk's number in the high half and the offset in the low half.
 #include "platform/row_store.h"
 
 #include <algorithm>
@@ -15,6 +16,31 @@ void PutLength(std::string& out, size_t length) {
         length >>= 7;
     }
     out += static_cast<char>(length);
+}
+
+char* PutLength(char* out, size_t length) {
+    while (length >= 0x80) {
+        *out++ = static_cast<char>((length & 0x7F) | 0x80);
+        length >>= 7;
+    }
+    *out++ = static_cast<char>(length);
+    return out;
+}
+
+size_t LengthSize(size_t length) {
+    size_t size = 1;
+    while (length >= 0x80) {
+        length >>= 7;
+        ++size;
+    }
+    return size;
+}
+
+// The record being rebuilt is kept between calls, unless a huge text made it huge.
+void ReleaseIfHuge(std::string& scratch, size_t limit) {
+    if (scratch.capacity() > limit) {
+        scratch = std::string();
+    }
 }
 
 size_t GetLength(const char*& at) {
@@ -39,6 +65,11 @@ std::string_view FieldOf(const char* record, int field) {
     }
 }
 
+constexpr uint64_t kOffsetMask = 0xFFFFFFFF;
+// Room left behind an oversized record, so that the small fields that follow it in its row
+// are written in place.
+constexpr size_t kHeadroom = 4096;
+
 }  // namespace
 
 void RowStore::SetFieldCount(int fieldCount) {
@@ -47,18 +78,30 @@ void RowStore::SetFieldCount(int fieldCount) {
 }
 
 void RowStore::AddRow() {
-    rows_.push_back(Append(std::string(fieldCount_, '\0')));
+    const auto fields = static_cast<size_t>(fieldCount_);
+    std::memset(Reserve(fields), 0, fields);
+    if (!inOrder_) {
+        places_.push_back(lastRecord_);
+    } else if (count_ % kStride == 0) {
+        marks_.push_back(lastRecord_);
+    }
+    ++count_;
 }
 
 std::string_view RowStore::Field(size_t row, int field) const {
-    return FieldOf(RecordAt(rows_[row]), field);
+    return FieldOf(RecordAt(Location(row)), field);
 }
 
 void RowStore::SetField(size_t row, int field, std::string_view text) {
-    if (rows_[row] == lastRecord_ && SetTailField(field, text)) {
+    const uint64_t place = Location(row);
+    const bool lastWritten = place == lastRecord_;
+    if (lastWritten && SetTailField(field, text)) {
         return;
     }
-    const char* old = RecordAt(rows_[row]);
+    if (!lastWritten) {
+        MakePlaces();  // the new record will stand behind the last one, out of order
+    }
+    const char* old = RecordAt(place);
     std::string& record = scratch_;
     record.clear();
     for (int i = 0; i < fieldCount_; ++i) {
@@ -66,87 +109,148 @@ void RowStore::SetField(size_t row, int field, std::string_view text) {
         PutLength(record, value.size());
         record += value;
     }
-    if (rows_[row] == lastRecord_ && chunkSizes_.back() == kChunkSize) {
-        // The last record written: write over it rather than leave it behind.
-        used_ = static_cast<size_t>(lastRecord_ & 0xFFFFFFFF);
+    if (lastWritten) {
+        DropLastRecord();  // written over rather than left behind
     }
-    rows_[row] = Append(record);
+    std::memcpy(Reserve(record.size()), record.data(), record.size());
+    if (!inOrder_) {
+        places_[row] = lastRecord_;
+    } else if (row % kStride == 0) {
+        marks_.back() = lastRecord_;
+    }
+    foundRow_ = SIZE_MAX;
+    ReleaseIfHuge(scratch_, kChunkSize);
 }
 
 // Filling the last row from left to right: when every field behind `field` is still empty,
 // the record is cut at `field` and written on from there, without copying what stands ahead.
 bool RowStore::SetTailField(int field, std::string_view text) {
-    if (chunkSizes_.back() != kChunkSize) {
-        return false;
-    }
-    char* record = chunks_.back().get() + (lastRecord_ & 0xFFFFFFFF);
+    Chunk& chunk = chunks_.back();
+    char* record = chunk.bytes.get() + (lastRecord_ & kOffsetMask);
     const char* at = record;
     for (int i = 0; i < field; ++i) {
         at += GetLength(at);
     }
     char* fieldStart = const_cast<char*>(at);
     GetLength(at);  // the old value of the field itself may be anything
-    for (int i = field + 1; i < fieldCount_; ++i) {
+    const auto emptyBehind = static_cast<size_t>(fieldCount_ - field - 1);
+    for (size_t i = 0; i < emptyBehind; ++i) {
         if (*at++ != 0) {
             return false;
         }
     }
-    std::string& tail = scratch_;
-    tail.clear();
-    PutLength(tail, text.size());
-    tail += text;
-    tail.append(static_cast<size_t>(fieldCount_ - field - 1), '\0');
-    const size_t start = static_cast<size_t>(fieldStart - chunks_.back().get());
-    if (start + tail.size() > kChunkSize) {
+    const auto start = static_cast<size_t>(fieldStart - chunk.bytes.get());
+    const size_t end = start + LengthSize(text.size()) + text.size() + emptyBehind;
+    if (end > chunk.size) {
         return false;
     }
-    std::memcpy(fieldStart, tail.data(), tail.size());
-    used_ = start + tail.size();
+    char* out = PutLength(fieldStart, text.size());
+    std::memcpy(out, text.data(), text.size());
+    std::memset(out + text.size(), 0, emptyBehind);
+    chunk.used = end;
     return true;
+}
+
+// The last row's record is always the last one written; a chunk that it leaves empty goes.
+void RowStore::DropLastRecord() {
+    chunks_.back().used = static_cast<size_t>(lastRecord_ & kOffsetMask);
+    if (chunks_.back().used == 0) {
+        chunks_.pop_back();
+    }
 }
 
 void RowStore::Clear() {
     chunks_.clear();
-    chunkSizes_.clear();
-    rows_.clear();
-    rows_.shrink_to_fit();
-    used_ = 0;
+    chunks_.shrink_to_fit();
+    count_ = 0;
+    inOrder_ = true;
+    marks_ = {};
+    places_ = {};
     lastRecord_ = UINT64_MAX;
+    foundRow_ = SIZE_MAX;
 }
 
 std::vector<uint32_t> RowStore::SortBy(int field, bool descending) {
-    std::vector<uint32_t> order(rows_.size());
+    MakePlaces();
+    std::vector<uint32_t> order(count_);
     std::iota(order.begin(), order.end(), 0u);
     std::stable_sort(order.begin(), order.end(), [&](uint32_t a, uint32_t b) {
-        const int c = RuntimeStringCompare(Field(a, field), Field(b, field));
+        const int c = RuntimeStringCompare(FieldOf(RecordAt(places_[a]), field),
+                                           FieldOf(RecordAt(places_[b]), field));
         return descending ? c > 0 : c < 0;
     });
-    std::vector<uint64_t> sorted(rows_.size());
+    std::vector<uint64_t> sorted(count_);
     for (size_t i = 0; i < order.size(); ++i) {
-        sorted[i] = rows_[order[i]];
+        sorted[i] = places_[order[i]];
     }
-    rows_ = std::move(sorted);
-    lastRecord_ = UINT64_MAX;
+    places_ = std::move(sorted);
     return order;
 }
 
-// A location is the chunk's number in the high half and the offset in the low half.
-uint64_t RowStore::Append(std::string_view record) {
-    if (chunks_.empty() || chunkSizes_.back() != kChunkSize || used_ + record.size() > kChunkSize) {
-        const size_t size = std::max(kChunkSize, record.size());
-        chunks_.push_back(std::make_unique<char[]>(size));
-        chunkSizes_.push_back(size);
-        used_ = 0;
+// Room for a record of `bytes` behind the last one; lastRecord_ is its location.
+char* RowStore::Reserve(size_t bytes) {
+    if (chunks_.empty() || chunks_.back().used + bytes > chunks_.back().size) {
+        const size_t size = bytes > kChunkSize ? bytes + kHeadroom : kChunkSize;
+        chunks_.push_back({std::make_unique_for_overwrite<char[]>(size), size, 0});
     }
-    std::memcpy(chunks_.back().get() + used_, record.data(), record.size());
-    lastRecord_ = (static_cast<uint64_t>(chunks_.size() - 1) << 32) | used_;
-    used_ += record.size();
-    if (chunkSizes_.back() != kChunkSize) {
-        used_ = chunkSizes_.back();  // an oversized record has its chunk to itself
+    Chunk& chunk = chunks_.back();
+    lastRecord_ = (static_cast<uint64_t>(chunks_.size() - 1) << 32) | chunk.used;
+    chunk.used += bytes;
+    return chunk.bytes.get() + (lastRecord_ & kOffsetMask);
+}
+
+uint64_t RowStore::Location(size_t row) const {
+    if (!inOrder_) {
+        return places_[row];
     }
-    return lastRecord_;
+    if (row + 1 == count_) {
+        return lastRecord_;
+    }
+    uint64_t at = 0;
+    size_t from = 0;
+    if (foundRow_ <= row && row - foundRow_ < row % kStride) {
+        at = foundAt_;
+        from = foundRow_;
+    } else {
+        at = marks_[row / kStride];
+        from = row - row % kStride;
+    }
+    for (; from < row; ++from) {
+        at = NextLocation(at);
+    }
+    foundRow_ = row;
+    foundAt_ = at;
+    return at;
+}
+
+// The record behind the one at `location`, in the same chunk or at the start of the next.
+uint64_t RowStore::NextLocation(uint64_t location) const {
+    const size_t chunk = location >> 32;
+    const char* record = RecordAt(location);
+    const char* at = record;
+    for (int i = 0; i < fieldCount_; ++i) {
+        at += GetLength(at);
+    }
+    const size_t end = (location & kOffsetMask) + static_cast<size_t>(at - record);
+    if (end == chunks_[chunk].used) {
+        return static_cast<uint64_t>(chunk + 1) << 32;
+    }
+    return (static_cast<uint64_t>(chunk) << 32) | end;
 }
 
 const char* RowStore::RecordAt(uint64_t location) const {
-    return chunks_[location >> 32].get() + (location & 0xFFFFFFFF);
+    return chunks_[location >> 32].bytes.get() + (location & kOffsetMask);
+}
+
+void RowStore::MakePlaces() {
+    if (!inOrder_) {
+        return;
+    }
+    places_.resize(count_);
+    for (size_t row = 0; row < count_; ++row) {
+        places_[row] = row % kStride == 0 ? marks_[row / kStride] : NextLocation(places_[row - 1]);
+    }
+    marks_ = {};
+    inOrder_ = false;
+    foundRow_ = SIZE_MAX;
 }

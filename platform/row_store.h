@@ -1,6 +1,8 @@
 // RowStore: the texts of a list's rows in plain arrays. Each row is one packed record of
-// length-prefixed fields in large chunks that never move, so a million rows cost little more
-// than their bytes and growing never copies them.
+// length-prefixed fields in large chunks that never move. While rows are only added and filled
+// in order, their records lie one behind the other, and only every 64th row's place is kept:
+// a million rows then cost little more than their bytes. A sort, or a change to an earlier
+// row, makes a table of every row's place.
 #pragma once
 
 #include <cstdint>
@@ -15,7 +17,7 @@ class RowStore {
 
     int FieldCount() const { return fieldCount_; }
     void SetFieldCount(int fieldCount);  // drops all rows
-    size_t Count() const { return rows_.size(); }
+    size_t Count() const { return count_; }
     void AddRow();
     // Valid until the next change of the store.
     std::string_view Field(size_t row, int field) const;
@@ -27,16 +29,32 @@ class RowStore {
 
   private:
     static constexpr size_t kChunkSize = 1 << 20;
+    static constexpr size_t kStride = 64;
 
-    uint64_t Append(std::string_view record);
+    struct Chunk {
+        std::unique_ptr<char[]> bytes;
+        size_t size = 0;
+        size_t used = 0;
+    };
+
+    char* Reserve(size_t bytes);
     bool SetTailField(int field, std::string_view text);
+    void DropLastRecord();
+    uint64_t Location(size_t row) const;
+    uint64_t NextLocation(uint64_t location) const;
     const char* RecordAt(uint64_t location) const;
+    void MakePlaces();
 
     int fieldCount_;
-    std::vector<std::unique_ptr<char[]>> chunks_;
-    std::vector<size_t> chunkSizes_;
-    size_t used_ = 0;  // bytes used in the last chunk
-    std::vector<uint64_t> rows_;
+    std::vector<Chunk> chunks_;
+    size_t count_ = 0;
+    // In order: the place of every kStride-th row. Otherwise, `places_` holds every row's.
+    bool inOrder_ = true;
+    std::vector<uint64_t> marks_;
+    std::vector<uint64_t> places_;
+    uint64_t lastRecord_ = UINT64_MAX;  // the last row's record
+    // The row found last, so that reading rows one after another takes one step each.
+    mutable size_t foundRow_ = SIZE_MAX;
+    mutable uint64_t foundAt_ = 0;
     std::string scratch_;  // the record being rebuilt, kept to spare an allocation per cell
-    uint64_t lastRecord_ = UINT64_MAX;
 };

@@ -107,6 +107,38 @@ TEST_P(RowStoreRandomTest, AgreesWithAPlainVectorOfRows) {
 INSTANTIATE_TEST_SUITE_P(Seeds, RowStoreRandomTest, ::testing::Values(1u, 2u, 3u, 42u),
                          [](const auto& info) { return "Seed" + std::to_string(info.param); });
 
+// A list load: rows added and filled only at the end, read back at random along the way, so
+// the rows are found from the sparse places kept while they stay in order.
+TEST_P(RowStoreRandomTest, RowsFilledInOrderAreFoundAgain) {
+    Driver driver(GetParam());
+    RowStore store(kFields);
+    Rows model;
+    for (int step = 0; step < 4000; ++step) {
+        const int op = driver.Pick(100);
+        if (op < 40 || model.empty()) {
+            store.AddRow();
+            model.emplace_back(kFields);
+        } else if (op < 97) {
+            const int field = driver.Pick(kFields);
+            const std::string text = driver.Pick(4) == 0
+                                         ? driver.Text()
+                                         : std::string(static_cast<size_t>(driver.Pick(40)),
+                                                       static_cast<char>('a' + field));
+            store.SetField(model.size() - 1, field, text);
+            model.back()[field] = text;
+        } else {
+            const size_t row = static_cast<size_t>(driver.Pick(model.size()));
+            ASSERT_EQ(store.Field(row, 0), model[row][0]) << "step " << step << " row " << row;
+        }
+    }
+    ExpectSame(store, model, "in order");
+    store.SetField(0, 1, "changed");  // an earlier row: every place is kept from now on
+    model[0][1] = "changed";
+    store.AddRow();
+    model.emplace_back(kFields);
+    ExpectSame(store, model, "after a change to the first row");
+}
+
 TEST(RowStoreTest, SortReturnsTheOldPositionOfEachRow) {
     RowStore store(1);
     for (const char* text : {"b", "A", "c", "a"}) {
