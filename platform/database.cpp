@@ -58,12 +58,19 @@ Ref<DatabaseField> RecordSet::Field(std::string_view name) const {
         return nullptr;
     }
     int column = -1;
-    for (const auto& [asked, found] : asked_) {
-        if (asked == name) {
-            column = found;
-            break;
+    // A loop asks the same names in the same order: the one behind the last is tried first.
+    if (nextAsked_ < asked_.size() && asked_[nextAsked_].first == name) {
+        column = asked_[nextAsked_].second;
+    } else {
+        nextAsked_ = 0;
+        for (; nextAsked_ < asked_.size(); ++nextAsked_) {
+            if (asked_[nextAsked_].first == name) {
+                column = asked_[nextAsked_].second;
+                break;
+            }
         }
     }
+    ++nextAsked_;
     if (column < 0) {
         for (size_t i = 0; i < columns_.size() && column < 0; ++i) {
             if (TextEquals(columns_[i], name)) {

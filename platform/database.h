@@ -50,6 +50,7 @@ class RecordSet {
     std::vector<std::string> columns_;
     // Names asked before, exactly as asked, with their column: a loop asks the same few.
     mutable std::vector<std::pair<std::string, int>> asked_;
+    mutable size_t nextAsked_ = 0;
     // One field object for each column, handed out again once its last holder has let go, so
     // a loop over a million rows allocates nothing per field.
     mutable std::vector<std::shared_ptr<DatabaseField>> fields_;

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <memory>
+#include <typeinfo>
 #include <utility>
 
 #include "platform/exceptions.h"
@@ -46,6 +47,9 @@ template <class T, class U>
 Ref<T> Cast(const Ref<U>& from) {
     if (from.IsNil()) {
         return nullptr;
+    }
+    if (typeid(*from.Shared()) == typeid(T)) {  // the common case, without the search
+        return Ref<T>(std::static_pointer_cast<T>(from.Shared()));
     }
     auto to = std::dynamic_pointer_cast<T>(from.Shared());
     if (!to) {

@@ -78,7 +78,7 @@ Match FindAscii(std::string_view source, size_t from, std::string_view find) {
                 return {};
             }
             at = static_cast<size_t>(static_cast<const char*>(hit) - source.data());
-        } else if (FoldAscii(source[at]) != first) {
+        } else if ((source[at] | 0x20) != first) {  // a letter in either case
             continue;
         }
         size_t i = 1;
