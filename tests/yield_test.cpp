@@ -5,7 +5,9 @@
 #include <QPushButton>
 
 #include "installer/copy.h"
+#include "platform/runtime.h"
 #include "platform/yield.h"
+#include "shell/startup.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -194,6 +196,29 @@ TEST_F(YieldTest, TheCopyPaintsAtEachPassAndEntersNoHandler) {
     EXPECT_EQ(paints, 3 + 3 * 5) << "one yield per child of every folder";
     EXPECT_EQ(HandlersEntered(), before);
     EXPECT_EQ(ReadFile(tree.Path() / "Plug-ins" / "Ostrelin.acroplugin" / "2" / "4"), "plug-in");
+}
+
+TEST_F(YieldTest, TheStartUpLoadWaitsForTheWindowAndPaintsItsRows) {
+    Store(Results(kRows));
+    SetYieldIntervalForTesting(std::chrono::nanoseconds(0));
+    std::vector<int> viewRows;
+    SetYieldPaintObserverForTesting([&](auto) {
+        auto window = Cast<class Window1>(_GetImplicitWindow("Window1.Window1"));
+        viewRows.push_back(View(window).model()->rowCount());
+    });
+    // The real _Main, with its event loop ended once the list is loaded.
+    QTimer poll;
+    QObject::connect(&poll, &QTimer::timeout, [] {
+        auto window = _GetImplicitWindow("Window1.Window1");
+        if (window && Cast<class Window1>(window)->Listbox1()->ListCount() == kRows) {
+            QCoreApplication::exit(0);
+        }
+    });
+    poll.start(10);
+    QTimer::singleShot(5000, [] { QCoreApplication::exit(1); });
+    _Main();
+    ASSERT_EQ(viewRows.size(), static_cast<size_t>(kRows)) << "every yield of the load painted";
+    EXPECT_EQ(viewRows.front(), 1);
 }
 
 // A clock that moves 10 ms at each reading.
