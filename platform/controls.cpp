@@ -10,17 +10,10 @@
 
 #include "platform/application.h"
 #include "platform/qt_color.h"
+#include "platform/shown_text.h"
 #include "platform/window.h"
 
 namespace {
-
-// Text of the system ends lines with carriage returns; Qt's text widgets want line feeds.
-QString DisplayText(const std::string& text) {
-    QString out = QString::fromStdString(text);
-    out.replace("\r\n", "\n");
-    out.replace('\r', '\n');
-    return out;
-}
 
 std::vector<std::string> SplitRows(const std::string& text) {
     std::vector<std::string> rows;
@@ -158,7 +151,7 @@ void Label::SetProperty(const std::string& name, const PropertyValue& value) {
 
 void Label::SetText(const std::string& text) {
     text_ = text;
-    static_cast<QLabel&>(LiveWidget()).setText(DisplayText(text));
+    static_cast<QLabel&>(LiveWidget()).setText(ShownLines(text, kShownInCell));
 }
 
 void Label::ApplyAlignment() {
@@ -202,7 +195,7 @@ void TextArea::SetProperty(const std::string& name, const PropertyValue& value) 
 
 void TextArea::SetText(const std::string& text) {
     text_ = text;
-    static_cast<QPlainTextEdit&>(LiveWidget()).setPlainText(DisplayText(text));
+    static_cast<QPlainTextEdit&>(LiveWidget()).setPlainText(ShownLines(text, kShownInTextArea));
 }
 
 TabPanel::TabPanel() {

@@ -4,6 +4,8 @@
 #include <QSize>
 #include <QTimer>
 
+#include "platform/shown_text.h"
+
 ListModel::ListModel() : store_(1) {}
 
 int ListModel::rowCount(const QModelIndex& parent) const {
@@ -22,7 +24,7 @@ QVariant ListModel::data(const QModelIndex& index, int role) const {
         case Qt::DisplayRole: {
             const std::string_view text =
                 store_.Field(static_cast<size_t>(index.row()), index.column());
-            return QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size()));
+            return ShownText(text, kShownInCell);
         }
         case Qt::SizeHintRole:
             return QSize(-1, rowHeight_);

@@ -6,6 +6,10 @@
 #include <QTimer>
 #include <QWidget>
 
+#ifdef __GLIBC__
+#include <malloc.h>
+#endif
+
 #include "platform/application.h"
 #include "platform/window.h"
 
@@ -44,6 +48,11 @@ void RaiseOpenOnceShown(QElapsedTimer waiting) {
 }  // namespace
 
 void RuntimeInit(int argc, char** argv) {
+#ifdef __GLIBC__
+    // A fixed threshold: the buffers of a huge text get mappings of their own and go back to
+    // the system when freed, rather than raise glibc's sliding threshold and stay in the heap.
+    mallopt(M_MMAP_THRESHOLD, 1 << 20);
+#endif
     if (QApplication::instance()) {
         return;
     }
