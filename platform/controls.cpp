@@ -150,7 +150,7 @@ void Label::SetProperty(const std::string& name, const PropertyValue& value) {
 }
 
 void Label::SetText(const std::string& text) {
-    text_ = text;
+    text_ = ShownPrefix(text, kShownInCell);
     static_cast<QLabel&>(LiveWidget()).setText(ShownLines(text, kShownInCell));
 }
 
@@ -194,7 +194,7 @@ void TextArea::SetProperty(const std::string& name, const PropertyValue& value) 
 }
 
 void TextArea::SetText(const std::string& text) {
-    text_ = text;
+    text_ = ShownPrefix(text, kShownInTextArea);
     static_cast<QPlainTextEdit&>(LiveWidget()).setPlainText(ShownLines(text, kShownInTextArea));
 }
 

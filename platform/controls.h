@@ -54,6 +54,8 @@ class PopupMenu : public Control {
     std::vector<std::string> rows_;
 };
 
+// A label, like a text area, holds and shows a text of a sensible length whole, and of a huge
+// one only the prefix that it shows: nothing reads a label's text back but tests.
 class Label : public Control {
   public:
     Label();

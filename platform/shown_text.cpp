@@ -1,10 +1,7 @@
 // Bounded prefixes of long texts for drawing.
 #include "platform/shown_text.h"
 
-namespace {
-
-// The prefix of at most `limit` bytes that ends on a whole character.
-std::string_view Prefix(std::string_view text, size_t limit) {
+std::string_view ShownPrefix(std::string_view text, size_t limit) {
     if (text.size() <= limit) {
         return text;
     }
@@ -15,10 +12,8 @@ std::string_view Prefix(std::string_view text, size_t limit) {
     return text.substr(0, end);
 }
 
-}  // namespace
-
 QString ShownText(std::string_view text, size_t limit) {
-    const std::string_view shown = Prefix(text, limit);
+    const std::string_view shown = ShownPrefix(text, limit);
     QString out = QString::fromUtf8(shown.data(), static_cast<qsizetype>(shown.size()));
     if (shown.size() < text.size()) {
         out += QChar(0x2026);

@@ -1,0 +1,148 @@
+// Huge texts in the store, as a damaged or hostile one can hold: a 20 MB `results` text on one
+// line, one of many lines, and a 5 MB `document`, each in one row among 1,000 ordinary ones.
+// For each it times the list load, a repaint of the list with that row on screen and the
+// double-click report open, and follows the memory: before the open, with the report shown,
+// after "Close" (which reloads the list) and after one more reload.
+//
+//   bench_huge_text [RUNS] [FOLDER]   (stores are made in FOLDER once and kept)
+//   bench_huge_text --one ROOT        (one measured process; used by the above)
+#include <QApplication>
+#include <QElapsedTimer>
+#include <QTableView>
+
+#include <cstdio>
+#include <fstream>
+#include <string>
+#include <vector>
+
+#include "platform/runtime.h"
+#include "scripts/demo_tree.h"
+#include "shell/startup.h"
+#include "shell/window1.h"
+#include "timing.h"
+
+namespace fs = std::filesystem;
+
+namespace {
+
+constexpr size_t kRows = 1000;
+constexpr size_t kHugeRow = 500;
+
+double ResidentMegabytes() {
+    std::ifstream status("/proc/self/status");
+    std::string line;
+    while (std::getline(status, line)) {
+        if (line.rfind("VmRSS:", 0) == 0) {
+            return std::atof(line.c_str() + 6) / 1024.0;
+        }
+    }
+    return 0;
+}
+
+// Prints "load repaint open before shown closed reloaded" (ms, ms, ms, MB, MB, MB, MB).
+int MeasureOne(int argc, char** argv, const char* root) {
+    setenv("ORBELANE_ROOT", root, 1);
+    RuntimeInit(argc, argv);
+    _EarlyStartup();
+    auto window = Window1();
+    window->Native()->show();
+    QCoreApplication::processEvents();
+    const double load = Milliseconds([&] { window->PagePanel1()->SetValue(1); });
+    QCoreApplication::processEvents();
+    auto list = window->Listbox1();
+    auto& view = *static_cast<QTableView*>(list->Widget());
+    list->SetListIndex(static_cast<long long>(kHugeRow));
+    view.scrollTo(view.model()->index(static_cast<int>(kHugeRow), 0));
+    std::vector<double> repaints;
+    for (int i = 0; i < 5; ++i) {
+        repaints.push_back(Milliseconds([&] { view.viewport()->grab(); }));
+    }
+    const double before = ResidentMegabytes();
+    const double open = Milliseconds([&] { window->Listbox1_DoubleClick(*list); });
+    QCoreApplication::processEvents();
+    const double shown = ResidentMegabytes();
+    window->PushButton2()->Push();
+    QCoreApplication::processEvents();
+    const double closed = ResidentMegabytes();
+    window->PagePanel1()->SetValue(1);
+    QCoreApplication::processEvents();
+    const double reloaded = ResidentMegabytes();
+    std::printf("%.1f %.1f %.1f %.1f %.1f %.1f %.1f\n", load, Median(repaints), open, before, shown,
+                closed, reloaded);
+    std::fflush(stdout);
+    std::_Exit(0);
+}
+
+struct HugeStore {
+    const char* name;
+    std::string results;
+    std::string document;
+};
+
+void MeasureStore(const fs::path& root, const HugeStore& huge, int runs) {
+    const fs::path store = demo::StorePath(root);
+    if (!fs::exists(store)) {
+        auto rows = demo::InventedResults(kRows, false);
+        rows[kHugeRow].results = huge.results;
+        rows[kHugeRow].document = huge.document;
+        demo::WriteStore(store, rows);
+    }
+    const std::string self = fs::canonical("/proc/self/exe").string();
+    std::vector<double> loads, repaints, opens, before, shown, closed, reloaded;
+    for (int i = 0; i < runs; ++i) {
+        const std::string command =
+            "QT_QPA_PLATFORM=offscreen '" + self + "' --one '" + root.string() + "' 2>/dev/null";
+        FILE* child = popen(command.c_str(), "r");
+        double v[7] = {};
+        if (std::fscanf(child, "%lf %lf %lf %lf %lf %lf %lf", &v[0], &v[1], &v[2], &v[3], &v[4],
+                        &v[5], &v[6]) != 7) {
+            std::fprintf(stderr, "the run did not report\n");
+        }
+        pclose(child);
+        for (auto [list, value] : {std::pair{&loads, v[0]},
+                                   {&repaints, v[1]},
+                                   {&opens, v[2]},
+                                   {&before, v[3]},
+                                   {&shown, v[4]},
+                                   {&closed, v[5]},
+                                   {&reloaded, v[6]}}) {
+            list->push_back(value);
+        }
+    }
+    const double b = Median(before);
+    std::printf("%s, median of %d:\n", huge.name, runs);
+    std::printf(
+        "  list load %.0f ms (target <= 1000), repaint %.1f ms (target <= 50), report "
+        "open %.0f ms (target <= 1000)\n",
+        Median(loads), Median(repaints), Median(opens));
+    std::printf(
+        "  memory %.0f MB before the open, %.0f MB with the report, %.0f MB after Close "
+        "(%+.0f%%), %.0f MB after a reload (%+.0f%%) (target within 10%%)\n",
+        b, Median(shown), Median(closed), 100 * (Median(closed) / b - 1), Median(reloaded),
+        100 * (Median(reloaded) / b - 1));
+    std::fflush(stdout);
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    if (argc > 2 && std::string(argv[1]) == "--one") {
+        return MeasureOne(argc, argv, argv[2]);
+    }
+    const int runs = argc > 1 ? std::atoi(argv[1]) : 5;
+    const fs::path folder =
+        argc > 2 ? fs::path(argv[2]) : fs::temp_directory_path() / "orbelane-bench";
+    constexpr size_t kMegabyte = 1 << 20;
+    const std::string ordinary = demo::ReportText(demo::Layout::A, "5012345678900", "EAN 13", 12);
+    MeasureStore(folder / "huge-one-line",
+                 {"20 MB results text on one line",
+                  "Code reads " + std::string(20 * kMegabyte, '7'), "Box.ai"},
+                 runs);
+    MeasureStore(folder / "huge-many-lines",
+                 {"20 MB results text of many lines",
+                  demo::ReportText(demo::Layout::A, "5012345678900", "EAN 13", 1000000), "Box.ai"},
+                 runs);
+    MeasureStore(folder / "huge-document",
+                 {"5 MB document", ordinary, std::string(5 * kMegabyte, 'd')}, runs);
+    return 0;
+}
