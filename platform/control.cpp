@@ -3,11 +3,11 @@
 
 #include <QApplication>
 #include <QFont>
-#include <QThread>
 #include <QWidget>
 
 #include <cmath>
 
+#include "platform/main_thread.h"
 #include "platform/qt_color.h"
 #include "platform/window.h"
 
@@ -108,11 +108,7 @@ void Control::SetWidget(QWidget* widget) {
 }
 
 QWidget& Control::LiveWidget() const {
-    if (QThread::currentThread() != QCoreApplication::instance()->thread()) {
-        throw ThreadAccessingUIException(
-            "A thread has attempted to manipulate a user interface element. This can only be "
-            "done from the application's main thread.");
-    }
+    RequireMainThread();
     if (!widget_) {
         throw NilObjectException("The control's window is gone");
     }

@@ -9,6 +9,7 @@
 #include <QTabWidget>
 
 #include "platform/application.h"
+#include "platform/main_thread.h"
 #include "platform/qt_color.h"
 #include "platform/shown_text.h"
 #include "platform/window.h"
@@ -43,6 +44,7 @@ void PagePanel::SetProperty(const std::string& name, const PropertyValue& value)
 }
 
 void PagePanel::SetValue(long long value) {
+    RequireMainThread();
     value_ = value;
     if (auto window = Window()) {
         window->UpdateVisibility();

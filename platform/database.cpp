@@ -3,6 +3,9 @@
 
 #include <sqlite3.h>
 
+#include <filesystem>
+#include <system_error>
+
 #include "platform/text.h"
 
 namespace {
@@ -112,6 +115,12 @@ void RecordSet::Close() {
 bool SQLiteDatabase::Connect() {
     Close();
     if (DatabaseFile.IsNil()) {
+        return false;
+    }
+    // Only a regular file, after links are followed, is opened: open() on a FIFO waits for a
+    // writer for ever, and a folder, socket or device is no database either.
+    std::error_code error;
+    if (!std::filesystem::is_regular_file(DatabaseFile->NativePath(), error)) {
         return false;
     }
     sqlite3* db = nullptr;

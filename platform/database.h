@@ -60,8 +60,8 @@ class SQLiteDatabase {
   public:
     Ref<FolderItem> DatabaseFile;
 
-    // Opens DatabaseFile read-only; true if it can now be queried. A busy or locked file is
-    // waited on for at most kBusyMilliseconds.
+    // Opens DatabaseFile read-only if it is a regular file; true if it can now be queried. A
+    // busy or locked file is waited on for at most kBusyMilliseconds.
     bool Connect();
     // Runs one statement. Nil if it fails, or if any statement follows it in the text.
     Ref<RecordSet> SQLSelect(const std::string& statement);

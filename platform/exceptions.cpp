@@ -8,8 +8,11 @@ std::shared_ptr<RuntimeException> _CallFunctionWithExceptionHandling(
     try {
         function(argument);
         return nullptr;
-    } catch (const RuntimeException& e) {
-        return std::make_shared<RuntimeException>(e);
+    } catch (RuntimeException& e) {
+        // The result shares ownership of the thrown object, so it keeps its class: the last
+        // resort names it, and an EndException is still one.
+        auto thrown = std::make_shared<std::exception_ptr>(std::current_exception());
+        return std::shared_ptr<RuntimeException>(thrown, &e);
     }
 }
 

@@ -42,6 +42,12 @@ class ThreadAccessingUIException : public RuntimeException {
     using RuntimeException::RuntimeException;
     std::string ClassName() const override { return "ThreadAccessingUIException"; }
 };
+// A file-system operation that failed in a way that a later look at the disk would not show.
+class IOException : public RuntimeException {
+  public:
+    using RuntimeException::RuntimeException;
+    std::string ClassName() const override { return "IOException"; }
+};
 class EndException : public RuntimeException {
   public:
     using RuntimeException::RuntimeException;
@@ -53,9 +59,9 @@ class ThreadEndException : public RuntimeException {
     std::string ClassName() const override { return "ThreadEndException"; }
 };
 
-// The global exception helper that _Main installs: runs `function(argument)` and hands back a
-// RuntimeException that left it, or nullptr. It catches every RuntimeException alike and
-// decides nothing; anything else goes on up. Not to be confused with
+// The global exception helper that _Main installs: runs `function(argument)` and hands back the
+// RuntimeException that left it, itself and not a copy, or nullptr. It catches every
+// RuntimeException alike and decides nothing; anything else goes on up. Not to be confused with
 // Application::_CallFunctionWithExceptionHandling, which runs event handlers and itself decides
 // what an exception leads to.
 std::shared_ptr<RuntimeException> _CallFunctionWithExceptionHandling(

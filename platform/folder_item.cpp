@@ -191,6 +191,18 @@ fs::path FileSystemRoot() {
     return fs::path(WithoutTrailingSlashes(root));
 }
 
+void MakeFileSystemRootAbsolute() {
+    const fs::path root = FileSystemRoot();
+    if (root.empty() || root.is_absolute()) {
+        return;
+    }
+    std::error_code error;
+    const fs::path absolute = fs::absolute(root, error).lexically_normal();
+    if (!error) {
+        setenv("ORBELANE_ROOT", WithoutTrailingSlashes(absolute.string()).c_str(), 1);
+    }
+}
+
 void SetResourcesFolderForTesting(const fs::path& folder) {
     resourcesForTesting = folder;
 }

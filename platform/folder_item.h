@@ -57,5 +57,8 @@ Ref<FolderItem> ApplicationData();
 
 // The root under which absolute paths lie: ORBELANE_ROOT, or empty for the real file system.
 std::filesystem::path FileSystemRoot();
+// A relative ORBELANE_ROOT is taken from the folder where the program starts: made absolute
+// once, at start, so that every path formed later is absolute.
+void MakeFileSystemRootAbsolute();
 // Tests give the resources folder of the program under test; an empty path restores it.
 void SetResourcesFolderForTesting(const std::filesystem::path& folder);

@@ -5,11 +5,14 @@
 #include <QMessageBox>
 #include <QString>
 
+#include "platform/main_thread.h"
+
 namespace {
 std::function<void(const std::string&)> testHandler;
 }
 
 void MsgBox(const std::string& text) {
+    RequireMainThread();
     if (testHandler) {
         testHandler(text);
         return;

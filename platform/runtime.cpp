@@ -11,6 +11,7 @@
 #endif
 
 #include "platform/application.h"
+#include "platform/folder_item.h"
 #include "platform/window.h"
 
 namespace {
@@ -20,7 +21,10 @@ std::function<void()> pendingLateStartup;
 int exitStatus = 0;
 std::unique_ptr<QApplication> ownApplication;
 
-int argcKept = 0;
+// Qt reads options such as -reverse or -platform from its arguments, and nothing on the
+// command line may influence start-up: Qt gets the program's name alone.
+int argcKept = 1;
+char* argvKept[] = {nullptr, nullptr};
 
 constexpr qint64 kOpenWaitLimitMs = 500;
 
@@ -53,11 +57,14 @@ void RuntimeInit(int argc, char** argv) {
     // the system when freed, rather than raise glibc's sliding threshold and stay in the heap.
     mallopt(M_MMAP_THRESHOLD, 1 << 20);
 #endif
+    MakeFileSystemRootAbsolute();
     if (QApplication::instance()) {
         return;
     }
-    argcKept = argc;
-    ownApplication = std::make_unique<QApplication>(argcKept, argv);
+    static char fallbackName[] = "orbelane";
+    argvKept[0] = argc > 0 && argv[0] ? argv[0] : fallbackName;
+    argcKept = 1;
+    ownApplication = std::make_unique<QApplication>(argcKept, argvKept);
     // The desktop ties the window to the installed desktop entry, and so to its icon, by this
     // name; the entry is named after the executable.
     QGuiApplication::setDesktopFileName(QCoreApplication::applicationName());

@@ -10,7 +10,8 @@
 using ExceptionHelper = std::shared_ptr<RuntimeException> (*)(const std::function<void(void*)>&,
                                                               void*);
 
-// Makes the Qt application object unless one exists already (tests make their own).
+// Makes the file-system root absolute, then the Qt application object unless one exists
+// already (tests make their own). Of the arguments only the program's name is used.
 void RuntimeInit(int argc, char** argv);
 void RuntimePerformInitializers();
 void _RuntimeSetExceptionHelper(ExceptionHelper helper);

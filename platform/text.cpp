@@ -4,12 +4,18 @@
 
 #include <QChar>
 
+#include <locale.h>
 #include <algorithm>
 #include <charconv>
 #include <cmath>
+#include <cstdlib>
 #include <cstring>
 #include <limits>
 #include <vector>
+
+#ifdef __APPLE__
+#include <xlocale.h>
+#endif
 
 namespace {
 
@@ -253,7 +259,13 @@ double Val(std::string_view source) {
         number.remove_prefix(1);
     }
     double value = 0.0;
-    std::from_chars(number.data(), number.data() + number.size(), value);
+    if (std::from_chars(number.data(), number.data() + number.size(), value).ec ==
+        std::errc::result_out_of_range) {
+        // from_chars gives nothing beyond the range of a double; strtod in the C locale gives
+        // what a double holds there: infinity, or the nearest representable value.
+        static const locale_t cLocale = newlocale(LC_ALL_MASK, "C", nullptr);
+        value = strtod_l(std::string(number).c_str(), nullptr, cLocale);
+    }
     return value;
 }
 

@@ -11,6 +11,7 @@
 
 #include "platform/application.h"
 #include "platform/focus_order.h"
+#include "platform/main_thread.h"
 #include "platform/menu.h"
 #include "platform/native_window.h"
 #include "platform/qt_color.h"
@@ -45,6 +46,7 @@ Window::~Window() {
 }
 
 void Window::Constructor() {
+    RequireMainThread();
     native_ = new NativeWindow(weak_from_this());
     native_->setAttribute(Qt::WA_DeleteOnClose, false);
     client_ = new ClientArea(weak_from_this());
@@ -92,6 +94,7 @@ std::string Window::Title() const {
 }
 
 void Window::SetBackColor(Color color) {
+    RequireMainThread();
     backColor_ = color;
     if (client_) {
         QPalette palette = client_->palette();
@@ -102,6 +105,7 @@ void Window::SetBackColor(Color color) {
 }
 
 void Window::SetMenuBar(Ref<::MenuBar> menuBar) {
+    RequireMainThread();
     menuBar_ = std::move(menuBar);
     if (native_ && menuBar_) {
         native_->setMenuBar(BuildNativeMenuBar(*menuBar_));
@@ -109,12 +113,14 @@ void Window::SetMenuBar(Ref<::MenuBar> menuBar) {
 }
 
 void Window::_AddControl(const Ref<Control>& control, const std::string& name) {
+    RequireMainThread();
     control->SetProperty("Name", name);
     controls_.push_back(control);
     control->AttachTo(shared_from_this());
 }
 
 Ref<Control> Window::_ControlByName(const std::string& name) const {
+    RequireMainThread();
     for (const auto& control : controls_) {
         if (control->Name() == name) {
             return control;
@@ -124,6 +130,7 @@ Ref<Control> Window::_ControlByName(const std::string& name) const {
 }
 
 Ref<Control> Window::_ControlByNameIndex(const std::string& name, long long index) const {
+    RequireMainThread();
     for (const auto& control : controls_) {
         if (control->Name() == name && control->Index() == index) {
             return control;
@@ -133,6 +140,7 @@ Ref<Control> Window::_ControlByNameIndex(const std::string& name, long long inde
 }
 
 void Window::Close() {
+    RequireMainThread();
     if (native_) {
         native_->close();
     }
@@ -167,6 +175,7 @@ void ReleaseAllWindows() {
 }
 
 Ref<Window> _GetImplicitWindow(const std::string& className) {
+    RequireMainThread();
     for (const auto& window : openWindows) {
         if (window->ClassName() == className && window->IsOpen()) {
             return window;

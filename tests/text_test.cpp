@@ -84,6 +84,19 @@ TEST(Text, ValReadsTheLeadingNumber) {
     EXPECT_EQ(Val("."), 0.0);
 }
 
+// Beyond the range of a double the value is what a double makes of the text.
+TEST(Text, ValBeyondTheRangeOfADouble) {
+    const double infinity = std::numeric_limits<double>::infinity();
+    EXPECT_EQ(Val("1e999"), infinity);
+    EXPECT_EQ(Val("-1e999"), -infinity);
+    EXPECT_EQ(Val(std::string(400, '9')), infinity);
+    EXPECT_EQ(Val("1" + std::string(400, '0') + " Pro"), infinity);
+    EXPECT_EQ(Val("1e-999"), 0.0);
+    EXPECT_EQ(Val("4e-320"), 4e-320) << "a subnormal value";
+    EXPECT_EQ(Val("1e99999999999999999999"), infinity);
+    EXPECT_EQ(Int64FromDouble(Val("1e999")), std::numeric_limits<long long>::max());
+}
+
 TEST(Text, Int64FromDoubleCutsTowardsZeroAndSaturates) {
     EXPECT_EQ(Int64FromDouble(22.9), 22);
     EXPECT_EQ(Int64FromDouble(-22.9), -22);
