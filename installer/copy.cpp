@@ -4,11 +4,13 @@
 #include "platform/runtime.h"
 
 void CopyFileOrFolder(Ref<FolderItem> source, Ref<FolderItem> destination) {
-    StackCheck stackCheck;
     if (!source->Directory()) {
         source->CopyFileTo(destination);
         return;
     }
+    // A link back up the tree would recurse without end: the folder met again on the current
+    // path raises StackOverflowException here, before anything of it is created.
+    FolderLoopCheck loopCheck(*source);
     Ref<FolderItem> newFolder = destination->Child(source->Name());
     newFolder->CreateAsFolder();
     for (long long index = 1; index <= source->Count(); ++index) {

@@ -43,6 +43,8 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
 
     // Raised once when the window has built all its controls.
     virtual void RaiseOpen() {}
+    // Return or Enter that no control took: a shown default button presses itself and says so.
+    virtual bool PressAsDefault() { return false; }
 
     // Platform use: the widget, and the window's hand-over when the control is entered.
     QWidget* Widget() const { return widget_; }

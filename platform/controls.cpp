@@ -79,6 +79,14 @@ void PushButton::Push() {
     static_cast<QPushButton&>(LiveWidget()).click();
 }
 
+bool PushButton::PressAsDefault() {
+    if (!BoolProperty("Default") || !IsShown() || !LiveWidget().isEnabled()) {
+        return false;
+    }
+    Push();
+    return true;
+}
+
 PopupMenu::PopupMenu() {
     SetWidget(new QComboBox);
 }

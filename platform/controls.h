@@ -30,6 +30,7 @@ class PushButton : public Control {
     PushButton();
     void SetProperty(const std::string& name, const PropertyValue& value) override;
     void Push();  // as a click of the user
+    bool PressAsDefault() override;
 
     std::function<void(PushButton&)> Action;
 };

@@ -1,4 +1,4 @@
-// Exception helpers of the run-time: the global helper, the last resort and the stack check.
+// Exception helpers of the run-time: the global helper and the last resort.
 #include "platform/exceptions.h"
 
 #include <cstdio>
@@ -21,20 +21,3 @@ void _UnhandledException(const RuntimeException& exception) {
     std::fflush(stderr);
 }
 
-namespace {
-int depth = 0;
-}
-
-// A depth limit stands in for the stack test: 32 levels is deeper than any plug-in bundle
-// and below the 40 symbolic links that the kernel resolves in one path, so a link that
-// points back up the tree ends here rather than in a file error.
-StackCheck::StackCheck() {
-    if (depth >= kMaxDepth) {
-        throw StackOverflowException("Stack overflow");
-    }
-    ++depth;
-}
-
-StackCheck::~StackCheck() {
-    --depth;
-}

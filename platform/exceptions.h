@@ -74,15 +74,3 @@ void _UnhandledException(const RuntimeException& exception);
 // The cooperative yield at the end of each pass of a long loop. It keeps the window drawn and
 // runs nothing else: no input, timer or posted call (see platform/yield.h).
 void RuntimeBackgroundTask();
-
-// Entry check of a recursive function: counts nesting and raises StackOverflowException
-// before the recursion can exhaust the real stack.
-class StackCheck {
-  public:
-    StackCheck();
-    ~StackCheck();
-    StackCheck(const StackCheck&) = delete;
-    StackCheck& operator=(const StackCheck&) = delete;
-
-    static constexpr int kMaxDepth = 32;
-};

@@ -101,25 +101,6 @@ std::string FolderItem::ShellPath() const {
     return out;
 }
 
-// An item of that name already in the destination is replaced, so that a second install
-// really installs the new plug-in.
-void FolderItem::CopyFileTo(const Ref<FolderItem>& destination) const {
-    const fs::path target =
-        destination->Directory() ? destination->path_ / path_.filename() : destination->path_;
-    std::error_code error;
-    if (fs::is_directory(path_, error)) {
-        fs::copy(path_, target, fs::copy_options::recursive | fs::copy_options::overwrite_existing,
-                 error);
-    } else {
-        fs::copy_file(path_, target, fs::copy_options::overwrite_existing, error);
-    }
-}
-
-void FolderItem::CreateAsFolder() const {
-    std::error_code error;
-    fs::create_directory(path_, error);
-}
-
 // Children are sorted by name, so that the order is the same on every machine.
 const std::vector<std::string>& FolderItem::Children() const {
     std::error_code error;

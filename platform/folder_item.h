@@ -25,10 +25,16 @@ class FolderItem {
     // The absolute path with a backslash before each blank and each backslash.
     std::string ShellPath() const;
     const std::filesystem::path& NativePath() const { return path_; }
-    // Copies this item into `destination` under its own name when that is a folder, or to
-    // that path otherwise. A failure is not raised: a later Exists tells.
+    // Copies this item into the folder `destination` under its own name, replacing an item of
+    // that name. Into anything but a folder it writes nothing. Failures: see CreateAsFolder.
     void CopyFileTo(const Ref<FolderItem>& destination) const;
-    // Creates a folder here; where one stands already, it does nothing.
+    // Creates a folder here; where one stands already, it does nothing. Both writing
+    // operations raise IOException when a failure would pass a later Exists unseen: an item
+    // that can't be read (a dangling link, an unreadable file, a FIFO), or something other
+    // than the intended item left at the path (a file where the folder goes, a failed
+    // replacement, a partial copy). Where the destination only refuses new items (it is
+    // missing, not a folder, or not writable) and nothing stands at the path, they write
+    // nothing and raise nothing: Exists tells.
     void CreateAsFolder() const;
 
   private:
@@ -41,6 +47,20 @@ class FolderItem {
     mutable std::filesystem::file_time_type childrenStamp_;
     mutable std::filesystem::file_time_type listedAt_;
     mutable bool childrenRead_ = false;
+};
+
+// Entry check of a recursive walk over folders: raises StackOverflowException when `folder`,
+// the same device and inode, is already being walked further up the current path, which only
+// a link back up the tree can make. Depth itself is bounded only by the tree.
+class FolderLoopCheck {
+  public:
+    explicit FolderLoopCheck(const FolderItem& folder);
+    ~FolderLoopCheck();
+    FolderLoopCheck(const FolderLoopCheck&) = delete;
+    FolderLoopCheck& operator=(const FolderLoopCheck&) = delete;
+
+  private:
+    bool entered_ = false;
 };
 
 // Mode 1: a shell path, where a backslash escapes the character behind it. Mode 3: a native

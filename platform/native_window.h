@@ -25,6 +25,9 @@ class NativeWindow : public QMainWindow {
 
   protected:
     void closeEvent(QCloseEvent* event) override;
+    // Return or Enter that the focused control left alone reaches the window's default button,
+    // wherever the focus is; an open popup keeps its keys, since they never reach here.
+    void keyPressEvent(QKeyEvent* event) override;
 
   private:
     std::weak_ptr<Window> owner_;

@@ -3,6 +3,7 @@
 #include "platform/window.h"
 
 #include <QCloseEvent>
+#include <QKeyEvent>
 #include <QLayout>
 #include <QMenuBar>
 #include <QWidget>
@@ -30,6 +31,20 @@ void NativeWindow::closeEvent(QCloseEvent* event) {
 bool ClientArea::focusNextPrevChild(bool next) {
     const auto owner = owner_.lock();
     return owner && MoveFocus(owner->Controls(), next);
+}
+
+void NativeWindow::keyPressEvent(QKeyEvent* event) {
+    const bool plain = (event->modifiers() & ~Qt::KeypadModifier) == Qt::NoModifier;
+    const bool returnKey = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
+    if (auto owner = owner_.lock(); owner && plain && returnKey) {
+        for (const auto& control : owner->Controls()) {
+            if (control->PressAsDefault()) {
+                event->accept();
+                return;
+            }
+        }
+    }
+    QMainWindow::keyPressEvent(event);
 }
 
 Window::Window(std::string className) : className_(std::move(className)) {}

@@ -1,4 +1,7 @@
 // File items in temporary trees: shell paths, children, order, copies and the root mapping.
+#include <sys/stat.h>
+#include <unistd.h>
+
 #include "platform/folder_item.h"
 #include "support.h"
 
@@ -91,6 +94,71 @@ TEST_F(FolderItemTest, CopyFileToPutsTheCopyInsideAFolderAndReplaces) {
     source->CopyFileTo(GetFolderItem((tree.Path() / "none/x").string(), 3));  // fails silently
     EXPECT_FALSE(fs::exists(tree.Path() / "none"));
     EXPECT_THROW(source->CopyFileTo(nullptr), NilObjectException);
+
+    // A read-only copy of an earlier install is replaced as well.
+    fs::permissions(tree.Path() / "dst/plugin.aip", fs::perms::owner_read);
+    WriteFile(tree.Path() / "src/plugin.aip", "newer");
+    source->CopyFileTo(GetFolderItem((tree.Path() / "dst").string(), 3));
+    EXPECT_EQ(ReadFile(tree.Path() / "dst/plugin.aip"), "newer");
+}
+
+TEST_F(FolderItemTest, CopyFileToWritesNothingIntoWhatIsNotAFolder) {
+    WriteFile(tree.Path() / "src/plugin.aip", "new");
+    WriteFile(tree.Path() / "DC/Plug-ins", "a stray file");
+    Ref<FolderItem> source = GetFolderItem((tree.Path() / "src/plugin.aip").string(), 3);
+    source->CopyFileTo(GetFolderItem((tree.Path() / "DC/Plug-ins").string(), 3));
+    source->CopyFileTo(GetFolderItem((tree.Path() / "DC/Missing").string(), 3));
+    EXPECT_EQ(ReadFile(tree.Path() / "DC/Plug-ins"), "a stray file");
+    EXPECT_FALSE(fs::exists(tree.Path() / "DC/Missing"));
+}
+
+struct Unreadable {
+    const char* name;
+    void (*make)(const fs::path& item);
+};
+
+class UnreadableTest : public FolderItemTest, public ::testing::WithParamInterface<Unreadable> {};
+
+// An item that can't be read would be skipped without a trace: the copy raises instead, and
+// writes nothing.
+TEST_P(UnreadableTest, CopyFileToRaisesAndWritesNothing) {
+    const fs::path item = tree.Path() / "src/item";
+    fs::create_directories(tree.Path() / "src");
+    fs::create_directories(tree.Path() / "dst");
+    GetParam().make(item);
+    if (geteuid() == 0 && fs::is_regular_file(item)) {
+        GTEST_SKIP() << "root reads any file";
+    }
+    EXPECT_THROW(GetFolderItem(item.string(), 3)
+                     ->CopyFileTo(GetFolderItem((tree.Path() / "dst").string(), 3)),
+                 IOException);
+    EXPECT_FALSE(fs::exists(fs::symlink_status(tree.Path() / "dst/item")));
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Items, UnreadableTest,
+    ::testing::Values(
+        Unreadable{"DanglingLink", [](const fs::path& p) { fs::create_symlink("gone", p); }},
+        Unreadable{"Fifo", [](const fs::path& p) { ASSERT_EQ(mkfifo(p.c_str(), 0600), 0); }},
+        Unreadable{"UnreadableFile",
+                   [](const fs::path& p) {
+                       WriteFile(p, "secret");
+                       fs::permissions(p, fs::perms::none);
+                   }}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+TEST_F(FolderItemTest, CreateAsFolderRaisesOnlyWhereSomethingElseStands) {
+    WriteFile(tree.Path() / "Plug-ins/Quilbrant.aip", "a leftover");
+    fs::create_symlink("gone", tree.Path() / "Plug-ins/Ostrelin.acroplugin");
+    fs::create_directories(tree.Path() / "Plug-ins/Folder");
+    auto at = [&](const char* path) { return GetFolderItem((tree.Path() / path).string(), 3); };
+    EXPECT_THROW(at("Plug-ins/Quilbrant.aip")->CreateAsFolder(), IOException);
+    EXPECT_THROW(at("Plug-ins/Ostrelin.acroplugin")->CreateAsFolder(), IOException);
+    EXPECT_EQ(ReadFile(tree.Path() / "Plug-ins/Quilbrant.aip"), "a leftover");
+    at("Plug-ins/Folder")->CreateAsFolder();
+    at("Missing/Folder")->CreateAsFolder();
+    at("Plug-ins/Quilbrant.aip/Contents")->CreateAsFolder();
+    EXPECT_FALSE(fs::exists(tree.Path() / "Missing"));
 }
 
 TEST_F(FolderItemTest, WithoutARootPathsStandAsTheyAre) {

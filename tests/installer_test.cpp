@@ -2,6 +2,9 @@
 // message that was shown and the files that stand afterwards.
 #include <unistd.h>
 
+#include <QAbstractItemView>
+#include <QComboBox>
+
 #include "installer/plugin_folders.h"
 #include "window_fixture.h"
 
@@ -183,6 +186,55 @@ TEST_F(InstallerTest, ACopyThatLeavesNoPluginIsToldAndWhatWasCopiedStays) {
               "There was an error copying the plugin please check you have access");
 }
 
+// A leftover or an alias of the plug-in's name, a plain file, where the plug-in's folder goes:
+// the copy can't put the plug-in there, and the user is told so instead of "Installed".
+TEST_F(InstallerTest, AFileWhereThePluginFolderGoesIsNoInstall) {
+    fs::create_directories(Illustrator("24") / "en_US/Plug-ins");
+    WriteFile(Illustrator("24") / "en_US/Plug-ins/Quilbrant.aip", "leftover");
+    WriteFile(Data() / "Adobe/Acrobat/DC/Plug-ins/Ostrelin.acroplugin", "alias");
+    StartUp();
+    EXPECT_EQ(Press(kIllustrator), "Unable to install at this time 1");
+    EXPECT_EQ(Press(kAcrobatDC), "Unable to install at this time 1");
+    EXPECT_EQ(ReadFile(Illustrator("24") / "en_US/Plug-ins/Quilbrant.aip"), "leftover");
+    EXPECT_EQ(ReadFile(Data() / "Adobe/Acrobat/DC/Plug-ins/Ostrelin.acroplugin"), "alias");
+}
+
+TEST_F(InstallerTest, AChildThatCannotBeCopiedIsNoInstall) {
+    fs::create_directories(Data() / "Adobe/Acrobat/DC/Plug-ins");
+    fs::create_symlink("nowhere", resources / "Ostrelin.acroplugin/Contents/Resources/link");
+    StartUp();
+    EXPECT_EQ(Press(kAcrobatDC), "Unable to install at this time 1");
+    const fs::path copied = Data() / "Adobe/Acrobat/DC/Plug-ins/Ostrelin.acroplugin/Contents";
+    EXPECT_TRUE(fs::exists(copied / "Info.plist")) << "items copied before it stay";
+}
+
+TEST_F(InstallerTest, ABundleTwoHundredLevelsDeepInstallsWhole) {
+    fs::create_directories(Data() / "Adobe/Acrobat/DC/Plug-ins");
+    fs::path deepest = "Ostrelin.acroplugin/Contents/Resources";
+    for (int level = 0; level < 200; ++level) {
+        deepest /= "d";
+    }
+    WriteFile(resources / deepest / "strings", "deep");
+    StartUp();
+    EXPECT_EQ(Press(kAcrobatDC), "Installed please restart Acrobat");
+    EXPECT_EQ(ReadFile(Data() / "Adobe/Acrobat/DC/Plug-ins" / deepest / "strings"), "deep");
+}
+
+// A plug-in that is a plain file, for a product folder without its Plug-ins folder: nothing is
+// written in the folder's place.
+TEST_F(InstallerTest, AFilePluginNeverTakesThePlaceOfTheFolder) {
+    fs::remove_all(resources / "Ostrelin.acroplugin");
+    WriteFile(resources / "Ostrelin.acroplugin", "plug-in");
+    fs::create_directories(Data() / "Adobe/Acrobat/DC");
+    StartUp();
+    EXPECT_EQ(Press(kAcrobatDC),
+              "There was an error copying the plugin please check you have access");
+    EXPECT_FALSE(fs::exists(Data() / "Adobe/Acrobat/DC/Plug-ins"));
+    fs::create_directories(Data() / "Adobe/Acrobat/DC/Plug-ins");
+    EXPECT_EQ(Press(kAcrobatDC), "Installed please restart Acrobat");
+    EXPECT_EQ(ReadFile(Data() / "Adobe/Acrobat/DC/Plug-ins/Ostrelin.acroplugin"), "plug-in");
+}
+
 TEST_F(InstallerTest, ALinkBackUpTheTreeEndsInTheCatchAllWithoutACrash) {
     fs::create_directories(Data() / "Adobe/Acrobat/DC/Plug-ins");
     fs::create_directory_symlink("..", resources / "Ostrelin.acroplugin/Contents/loop");
@@ -192,6 +244,46 @@ TEST_F(InstallerTest, ALinkBackUpTheTreeEndsInTheCatchAllWithoutACrash) {
     EXPECT_TRUE(fs::exists(copied / ".signature")) << "items copied before the loop stay";
     EXPECT_TRUE(fs::exists(copied / "Info.plist"));
     EXPECT_EQ(Window1()->PagePanel1()->Value(), 0) << "the program goes on";
+}
+
+// Return and Enter on the installation page press "Install Now" wherever the focus is; in the
+// open popup they choose a row instead.
+TEST_F(InstallerTest, ReturnPressesInstallNowFromAnywhereOnThePage) {
+    auto window = StartUp();
+    window->MainTabs()->Press(0);
+    ProcessEvents();
+    QWidget* client = window->Client();
+    std::vector<QWidget*> targets{client};
+    for (QWidget* widget : client->findChildren<QWidget*>()) {
+        if (widget->isVisible()) {
+            targets.push_back(widget);
+        }
+    }
+    ASSERT_GT(targets.size(), 5u);
+    for (QWidget* target : targets) {
+        for (Qt::Key key : {Qt::Key_Return, Qt::Key_Enter}) {
+            MessageLog log;
+            QTest::keyClick(target, key,
+                            key == Qt::Key_Enter ? Qt::KeypadModifier : Qt::NoModifier);
+            EXPECT_EQ(log.messages,
+                      std::vector<std::string>{"Choose which version of Acrobat you are using"})
+                << target->metaObject()->className() << " " << target->objectName().toStdString();
+        }
+    }
+
+    auto* popup = static_cast<QComboBox*>(window->PopupMenu1()->Widget());
+    popup->showPopup();
+    ProcessEvents();
+    QTest::keyClick(popup->view(), Qt::Key_Down);
+    MessageLog log;
+    QTest::keyClick(popup->view(), Qt::Key_Return);
+    ProcessEvents();
+    EXPECT_TRUE(log.messages.empty());
+    EXPECT_EQ(window->PopupMenu1()->Text(), "Acrobat X");
+
+    window->MainTabs()->Press(1);
+    QTest::keyClick(client, Qt::Key_Return);
+    EXPECT_TRUE(log.messages.empty()) << "no default button on the list page";
 }
 
 // The walk by itself, on the names that it meets.

@@ -1,0 +1,85 @@
+// Feeds arbitrary bytes to the database layer as a results store: the file is opened
+// read-only, listed as the list page lists it, and must come out of it unchanged.
+#include <unistd.h>
+
+#include <cstddef>
+#include <cstdint>
+#include <cstdio>
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <string>
+
+#include "platform/database.h"
+
+namespace {
+
+void Require(bool condition) {
+    if (!condition) {
+        std::abort();
+    }
+}
+
+std::string ReadAll(const std::filesystem::path& path) {
+    std::ifstream in(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+}
+
+// One store file for the whole run, in a folder of its own, rewritten for each input.
+const std::filesystem::path& StoreFile() {
+    static const std::filesystem::path file = [] {
+        std::string pattern =
+            (std::filesystem::temp_directory_path() / "store-fuzz-XXXXXX").string();
+        Require(mkdtemp(pattern.data()) != nullptr);
+        return std::filesystem::path(pattern) / "results.db";
+    }();
+    return file;
+}
+
+void List(SQLiteDatabase& db, const std::string& statement) {
+    Ref<RecordSet> rows = db.SQLSelect(statement);
+    if (rows.IsNil()) {
+        return;
+    }
+    for (int row = 0; !rows->Eof() && row < 1000; ++row, rows->MoveNext()) {
+        for (const char* column : {"results", "datetime", "document", "grade"}) {
+            Ref<DatabaseField> field = rows->Field(column);
+            if (field) {
+                const std::string& text = *field;
+                Require(text.size() < (size_t{1} << 31));
+            }
+        }
+        if (Ref<DatabaseField> id = rows->Field("id")) {
+            id->StringValue();
+        }
+    }
+    rows->Close();
+}
+
+}  // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
+    const std::filesystem::path& file = StoreFile();
+    const std::string bytes(reinterpret_cast<const char*>(data), size);
+    {
+        std::ofstream out(file, std::ios::binary | std::ios::trunc);
+        out << bytes;
+    }
+    {
+        SQLiteDatabase db;
+        db.DatabaseFile = GetFolderItem(file.string(), 3);
+        if (db.Connect()) {
+            List(db, "select * from results_store");
+            List(db, "select * from results_store where id = '1'");
+            List(db, "select name, sql from sqlite_master");
+        }
+        db.Close();
+    }
+    Require(ReadAll(file) == bytes);
+    // Nothing beside the store either: no journal, no WAL index.
+    const auto entries = std::distance(std::filesystem::directory_iterator(file.parent_path()),
+                                       std::filesystem::directory_iterator());
+    Require(entries == 1);
+    return 0;
+}
