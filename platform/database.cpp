@@ -4,6 +4,8 @@
 #include <sqlite3.h>
 
 #include <filesystem>
+#include <fstream>
+#include <string_view>
 #include <system_error>
 
 #include "platform/text.h"
@@ -32,6 +34,36 @@ bool IsBlankTail(sqlite3* db, const char* tail) {
 
 // A field that held a huge text gives its memory back rather than keep it for small ones.
 constexpr size_t kKeptCapacity = 1 << 16;
+
+// A path as the path of a file: URI, with the characters that would end or escape it encoded.
+std::string UriPath(const std::string& path) {
+    static const char* const kHex = "0123456789ABCDEF";
+    std::string out;
+    for (const unsigned char c : path) {
+        if (c == '%' || c == '?' || c == '#' || c < 0x21 || c >= 0x7F) {
+            out += '%';
+            out += kHex[c >> 4];
+            out += kHex[c & 0xF];
+        } else {
+            out += static_cast<char>(c);
+        }
+    }
+    return out;
+}
+
+// A database file in WAL mode (versions 2 in its header) with no -wal file beside it: the
+// last writer has closed it, and everything stands in the file itself.
+bool IsWalWithoutLog(const std::filesystem::path& file) {
+    char header[20] = {};
+    std::ifstream in(file, std::ios::binary);
+    if (!in.read(header, sizeof header) ||
+        std::string_view(header, 16) != std::string_view("SQLite format 3\0", 16)) {
+        return false;
+    }
+    std::error_code error;
+    return (header[18] == 2 || header[19] == 2) &&
+           !std::filesystem::exists(file.string() + "-wal", error);
+}
 
 }  // namespace
 
@@ -123,11 +155,18 @@ bool SQLiteDatabase::Connect() {
     if (!std::filesystem::is_regular_file(DatabaseFile->NativePath(), error)) {
         return false;
     }
+    const std::filesystem::path& file = DatabaseFile->NativePath();
+    std::string uri = "file:" + UriPath(file.string()) + "?mode=ro";
+    if (IsWalWithoutLog(file)) {
+        // No writer has it open, so it is read as it stands: opened as usual, SQLite would
+        // leave a -wal and a -shm file beside the store.
+        uri += "&immutable=1";
+    }
     sqlite3* db = nullptr;
     // A connection lives inside one handler on the one thread, so SQLite's own lock on every
     // call would be pure cost.
-    const int opened = sqlite3_open_v2(DatabaseFile->NativePath().c_str(), &db,
-                                       SQLITE_OPEN_READONLY | SQLITE_OPEN_NOMUTEX, nullptr);
+    const int opened = sqlite3_open_v2(
+        uri.c_str(), &db, SQLITE_OPEN_READONLY | SQLITE_OPEN_URI | SQLITE_OPEN_NOMUTEX, nullptr);
     std::shared_ptr<sqlite3> connection(db, sqlite3_close_v2);
     if (opened != SQLITE_OK) {
         return false;

@@ -89,6 +89,33 @@ TEST_F(StoreTest, AStoreLockedByTheWriterEndsSilentlyWithinTheBound) {
     EXPECT_EQ(Rows(kListQuery), 3) << "readable again once the writer lets go";
 }
 
+// A store that the plug-in keeps in WAL mode: read with the writer gone, nothing appears beside
+// it; read while the writer has it open, its rows so far are read.
+TEST_F(StoreTest, AStoreInWalModeIsReadWithoutWritingBesideIt) {
+    Write(demo::InventedResults(3));
+    Exec("pragma journal_mode=wal");
+    const std::string before = ReadFile(store);
+    auto beside = [this] {
+        std::vector<std::string> names;
+        for (const auto& entry : std::filesystem::directory_iterator(store.parent_path())) {
+            names.push_back(entry.path().filename().string());
+        }
+        return names;
+    };
+    ASSERT_EQ(beside(), std::vector<std::string>{"results.db"});
+    EXPECT_EQ(Rows(kListQuery), 3);
+    EXPECT_EQ(beside(), std::vector<std::string>{"results.db"});
+    EXPECT_EQ(ReadFile(store), before);
+
+    sqlite3* writer = nullptr;
+    ASSERT_EQ(sqlite3_open(store.c_str(), &writer), SQLITE_OK);
+    ASSERT_EQ(sqlite3_exec(writer, "insert into results_store (id) values ('new')", nullptr,
+                           nullptr, nullptr),
+              SQLITE_OK);
+    EXPECT_EQ(Rows(kListQuery), 4) << "the rows in the writer's log count too";
+    sqlite3_close(writer);
+}
+
 TEST_F(StoreTest, ReadsEveryRowAsTextAndNullAsEmptyText) {
     Write({{"7", std::nullopt, "Box.ai", std::nullopt, std::nullopt}, {"8", "2018", "", "A", "x"}});
     SQLiteDatabase db;
