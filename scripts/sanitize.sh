@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Builds the tests with AddressSanitizer and UndefinedBehaviorSanitizer in their own build
-# folder and runs them; any report fails the run. Only the test target and the program that it
-# starts are built, at -O1, to keep the step short.
+# folder and runs them; any report fails the run. Only the test targets and the program that
+# one of them starts are built, at -O1, to keep the step short.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 # Also for the test discovery that runs the instrumented binary at build time.
@@ -10,5 +10,5 @@ export LSAN_OPTIONS="suppressions=$PWD/tests/sanitizer/lsan.supp:print_suppressi
 export UBSAN_OPTIONS="halt_on_error=1:print_stacktrace=1"
 cmake -S . -B build-sanitize -DCMAKE_BUILD_TYPE=Debug -DCMAKE_CXX_FLAGS_DEBUG="-g -O1" \
   -DORBELANE_SANITIZE=ON -DORBELANE_BENCH=OFF
-cmake --build build-sanitize -j"$(nproc)" --target orbelane_tests
+cmake --build build-sanitize -j"$(nproc)" --target orbelane_tests orbelane_portal_tests
 QT_QPA_PLATFORM=offscreen ctest --test-dir build-sanitize --output-on-failure -j"$(nproc)"
