@@ -16,7 +16,8 @@ namespace {
 
 class CellDelegate : public QStyledItemDelegate {
   public:
-    explicit CellDelegate(Listbox& owner) : owner_(&owner) {}
+    // The view owns the delegate, which goes with it.
+    CellDelegate(Listbox& owner, QObject* view) : QStyledItemDelegate(view), owner_(&owner) {}
     void Forget() { owner_ = nullptr; }
 
     void paint(QPainter* painter, const QStyleOptionViewItem& option,
@@ -90,7 +91,7 @@ Listbox::Listbox() : model_(std::make_unique<ListModel>()) {
     view->setEditTriggers(QAbstractItemView::NoEditTriggers);
     view->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     view->setModel(model_.get());
-    view->setItemDelegate(new CellDelegate(*this));
+    view->setItemDelegate(new CellDelegate(*this, view));
     view->horizontalHeader()->setSectionsMovable(false);
     view->horizontalHeader()->setSectionsClickable(true);
     view->horizontalHeader()->setSortIndicatorShown(false);
