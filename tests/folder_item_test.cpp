@@ -16,7 +16,7 @@ class FolderItemTest : public ::testing::Test {
     ScopedRoot root{tree.Path()};
 };
 
-TEST_F(FolderItemTest, ShellPathsWithBlanksRoundTripWithoutTheRoot) {
+TEST_F(FolderItemTest, ShellPathsRoundTripWithoutTheRoot) {
     fs::create_directories(tree.Path() / "Users/user/Library/Application Support/Adobe");
     Ref<FolderItem> data = SpecialFolder::ApplicationData();
     EXPECT_EQ(data->ShellPath(), "/Users/user/Library/Application\\ Support");
@@ -25,39 +25,12 @@ TEST_F(FolderItemTest, ShellPathsWithBlanksRoundTripWithoutTheRoot) {
     EXPECT_TRUE(adobe->Directory());
     EXPECT_EQ(adobe->NativePath(), tree.Path() / "Users/user/Library/Application Support/Adobe");
     EXPECT_EQ(adobe->Name(), "Adobe");
-}
-
-TEST_F(FolderItemTest, BackslashesInNamesSurviveTheRoundTrip) {
-    fs::create_directories(tree.Path() / "odd\\name with blank");
-    Ref<FolderItem> odd = GetFolderItem((tree.Path() / "odd\\name with blank").string(), 3);
-    Ref<FolderItem> back = GetFolderItem(odd->ShellPath(), 1);
-    EXPECT_EQ(back->NativePath(), odd->NativePath());
-    EXPECT_TRUE(back->Exists());
-}
-
-TEST_F(FolderItemTest, APathEndingInSlashIsTheFolderItself) {
-    fs::create_directories(tree.Path() / "Applications/Acrobat/Plug-ins");
-    Ref<FolderItem> plugins = GetFolderItem("/Applications/Acrobat/Plug-ins/", 1);
-    EXPECT_EQ(plugins->Name(), "Plug-ins");
-    EXPECT_TRUE(plugins->Directory());
-    EXPECT_EQ(plugins->Child("x")->NativePath(), tree.Path() / "Applications/Acrobat/Plug-ins/x");
+    // A path ending in a slash is the folder itself.
+    Ref<FolderItem> slashed = GetFolderItem("/Users/user/Library/Application\\ Support/Adobe/", 1);
+    EXPECT_EQ(slashed->Name(), "Adobe");
+    EXPECT_EQ(slashed->Child("x")->NativePath(), adobe->NativePath() / "x");
     EXPECT_TRUE(GetFolderItem("relative/path", 1).IsNil());
     EXPECT_TRUE(GetFolderItem("/x", 2).IsNil());
-}
-
-TEST_F(FolderItemTest, AMissingChildCanBeAskedAndCreated) {
-    Ref<FolderItem> top = GetFolderItem(tree.Path().string(), 3);
-    Ref<FolderItem> missing = top->Child("Plug-ins");
-    EXPECT_FALSE(missing->Exists());
-    EXPECT_FALSE(missing->Directory());
-    EXPECT_EQ(missing->Count(), 0);
-    missing->CreateAsFolder();
-    EXPECT_TRUE(missing->Directory());
-    missing->CreateAsFolder();  // where a folder stands, nothing happens
-    EXPECT_TRUE(missing->Directory());
-    EXPECT_TRUE(top->Child("").IsNil());
-    top->Child("a")->Child("b")->CreateAsFolder();  // no parent: no folder, and no exception
-    EXPECT_FALSE(top->Child("a")->Exists());
 }
 
 TEST_F(FolderItemTest, ItemsComeInNameOrderDotFilesIncluded) {
@@ -73,43 +46,30 @@ TEST_F(FolderItemTest, ItemsComeInNameOrderDotFilesIncluded) {
     EXPECT_EQ(names, (std::vector<std::string>{".DS_Store", "C", "a", "b"}));
     EXPECT_TRUE(folder->Item(0).IsNil());
     EXPECT_TRUE(folder->Item(5).IsNil());
+    WriteFile(tree.Path() / "f/new", "x");  // seen right after a listing
+    EXPECT_EQ(folder->Count(), 5);
 }
 
-TEST_F(FolderItemTest, CountSeesAChangeMadeRightAfterAListing) {
-    fs::create_directories(tree.Path() / "f");
-    Ref<FolderItem> folder = GetFolderItem((tree.Path() / "f").string(), 3);
-    EXPECT_EQ(folder->Count(), 0);
-    WriteFile(tree.Path() / "f/new", "x");
-    EXPECT_EQ(folder->Count(), 1);
-    fs::remove(tree.Path() / "f/new");
-    EXPECT_EQ(folder->Count(), 0);
-}
-
-TEST_F(FolderItemTest, CopyFileToPutsTheCopyInsideAFolderAndReplaces) {
+TEST_F(FolderItemTest, CopyFileToPutsTheCopyInsideAFolderOnly) {
     WriteFile(tree.Path() / "src/plugin.aip", "new");
     WriteFile(tree.Path() / "dst/plugin.aip", "old");
     Ref<FolderItem> source = GetFolderItem((tree.Path() / "src/plugin.aip").string(), 3);
     source->CopyFileTo(GetFolderItem((tree.Path() / "dst").string(), 3));
     EXPECT_EQ(ReadFile(tree.Path() / "dst/plugin.aip"), "new");
-    source->CopyFileTo(GetFolderItem((tree.Path() / "none/x").string(), 3));  // fails silently
-    EXPECT_FALSE(fs::exists(tree.Path() / "none"));
     EXPECT_THROW(source->CopyFileTo(nullptr), NilObjectException);
+
+    // Into a stray file or a missing folder nothing is written, and nothing raised.
+    WriteFile(tree.Path() / "DC/Plug-ins", "a stray file");
+    source->CopyFileTo(GetFolderItem((tree.Path() / "DC/Plug-ins").string(), 3));
+    source->CopyFileTo(GetFolderItem((tree.Path() / "DC/Missing").string(), 3));
+    EXPECT_EQ(ReadFile(tree.Path() / "DC/Plug-ins"), "a stray file");
+    EXPECT_FALSE(fs::exists(tree.Path() / "DC/Missing"));
 
     // A read-only copy of an earlier install is replaced as well.
     fs::permissions(tree.Path() / "dst/plugin.aip", fs::perms::owner_read);
     WriteFile(tree.Path() / "src/plugin.aip", "newer");
     source->CopyFileTo(GetFolderItem((tree.Path() / "dst").string(), 3));
     EXPECT_EQ(ReadFile(tree.Path() / "dst/plugin.aip"), "newer");
-}
-
-TEST_F(FolderItemTest, CopyFileToWritesNothingIntoWhatIsNotAFolder) {
-    WriteFile(tree.Path() / "src/plugin.aip", "new");
-    WriteFile(tree.Path() / "DC/Plug-ins", "a stray file");
-    Ref<FolderItem> source = GetFolderItem((tree.Path() / "src/plugin.aip").string(), 3);
-    source->CopyFileTo(GetFolderItem((tree.Path() / "DC/Plug-ins").string(), 3));
-    source->CopyFileTo(GetFolderItem((tree.Path() / "DC/Missing").string(), 3));
-    EXPECT_EQ(ReadFile(tree.Path() / "DC/Plug-ins"), "a stray file");
-    EXPECT_FALSE(fs::exists(tree.Path() / "DC/Missing"));
 }
 
 struct Unreadable {
@@ -148,6 +108,9 @@ INSTANTIATE_TEST_SUITE_P(
     [](const auto& info) { return std::string(info.param.name); });
 
 TEST_F(FolderItemTest, CreateAsFolderRaisesOnlyWhereSomethingElseStands) {
+    Ref<FolderItem> missing = GetFolderItem(tree.Path().string(), 3)->Child("Plug-ins");
+    EXPECT_FALSE(missing->Exists());
+    EXPECT_EQ(missing->Count(), 0);
     WriteFile(tree.Path() / "Plug-ins/Quilbrant.aip", "a leftover");
     fs::create_symlink("gone", tree.Path() / "Plug-ins/Ostrelin.acroplugin");
     fs::create_directories(tree.Path() / "Plug-ins/Folder");
@@ -155,24 +118,20 @@ TEST_F(FolderItemTest, CreateAsFolderRaisesOnlyWhereSomethingElseStands) {
     EXPECT_THROW(at("Plug-ins/Quilbrant.aip")->CreateAsFolder(), IOException);
     EXPECT_THROW(at("Plug-ins/Ostrelin.acroplugin")->CreateAsFolder(), IOException);
     EXPECT_EQ(ReadFile(tree.Path() / "Plug-ins/Quilbrant.aip"), "a leftover");
-    at("Plug-ins/Folder")->CreateAsFolder();
+    at("Plug-ins/Folder")->CreateAsFolder();  // where a folder stands, nothing happens
     at("Missing/Folder")->CreateAsFolder();
     at("Plug-ins/Quilbrant.aip/Contents")->CreateAsFolder();
-    EXPECT_FALSE(fs::exists(tree.Path() / "Missing"));
+    EXPECT_FALSE(fs::exists(tree.Path() / "Missing"));  // no parent: no folder, no exception
+    EXPECT_TRUE(GetFolderItem(tree.Path().string(), 3)->Child("").IsNil());
 }
 
-TEST_F(FolderItemTest, WithoutARootPathsStandAsTheyAre) {
+TEST_F(FolderItemTest, WithoutARootBlanksAndBackslashesRoundTrip) {
     unsetenv("ORBELANE_ROOT");
-    Ref<FolderItem> item = GetFolderItem((tree.Path() / "a b").string(), 3);
-    EXPECT_EQ(GetFolderItem(item->ShellPath(), 1)->NativePath(), tree.Path() / "a b");
-    EXPECT_NE(item->ShellPath().find("a\\ b"), std::string::npos);
-}
-
-TEST_F(FolderItemTest, ATestCanGiveTheResourcesFolderAndTakeItBack) {
-    SetResourcesFolderForTesting(tree.Path());
-    EXPECT_EQ(SpecialFolder::Resources()->NativePath(), tree.Path());
-    SetResourcesFolderForTesting({});
-    EXPECT_NE(SpecialFolder::Resources()->NativePath(), tree.Path());
+    fs::create_directories(tree.Path() / "odd\\name with blank");
+    Ref<FolderItem> item = GetFolderItem((tree.Path() / "odd\\name with blank").string(), 3);
+    EXPECT_EQ(GetFolderItem(item->ShellPath(), 1)->NativePath(), item->NativePath());
+    EXPECT_NE(item->ShellPath().find("with\\ blank"), std::string::npos);
+    EXPECT_TRUE(GetFolderItem(item->ShellPath(), 1)->Exists());
 }
 
 }  // namespace

@@ -66,7 +66,6 @@ INSTANTIATE_TEST_SUITE_P(
     ::testing::Values(
         HostileStore{"Folder", [](const fs::path& p) { fs::create_directory(p); }, {}},
         HostileStore{"ZeroBytes", [](const fs::path& p) { WriteFile(p, ""); }, {}},
-        HostileStore{"TextFile", [](const fs::path& p) { WriteFile(p, "results\n"); }, {}},
         HostileStore{"Corrupt", MakeCorrupt, {}},
         HostileStore{"MissingTable",
                      [](const fs::path& p) { demo::WriteStore(p, {}, "create table t (id text)"); },
