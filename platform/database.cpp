@@ -151,11 +151,11 @@ bool SQLiteDatabase::Connect() {
     }
     // Only a regular file, after links are followed, is opened: open() on a FIFO waits for a
     // writer for ever, and a folder, socket or device is no database either.
+    const std::filesystem::path& file = DatabaseFile->NativePath();
     std::error_code error;
-    if (!std::filesystem::is_regular_file(DatabaseFile->NativePath(), error)) {
+    if (!std::filesystem::is_regular_file(file, error)) {
         return false;
     }
-    const std::filesystem::path& file = DatabaseFile->NativePath();
     std::string uri = "file:" + UriPath(file.string()) + "?mode=ro";
     if (IsWalWithoutLog(file)) {
         // No writer has it open, so it is read as it stands: opened as usual, SQLite would

@@ -38,7 +38,7 @@ void ListView::SetDesignedWidths(std::vector<int> widths) {
 }
 
 QString ListView::SelectionText() const {
-    if (!model() || !selectionModel()) {
+    if (!model() || !HasSelectedRow()) {
         return {};
     }
     const QModelIndexList rows = selectionModel()->selectedRows();
@@ -62,7 +62,7 @@ void ListView::CopySelection() const {
 
 void ListView::keyPressEvent(QKeyEvent* event) {
     const bool open = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
-    if (open && selectionModel() && selectionModel()->hasSelection()) {
+    if (open && HasSelectedRow()) {
         event->accept();
         if (OpenRequested) {
             OpenRequested();

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <QElapsedTimer>
+#include <QItemSelectionModel>
 #include <QTableView>
 
 #include <functional>
@@ -19,6 +20,7 @@ class ListView : public QTableView {
     void SetDesignedWidths(std::vector<int> widths);
     // The heading line and the selected row, tab-separated, each line ending in a newline;
     // empty without a selection.
+    bool HasSelectedRow() const { return selectionModel() && selectionModel()->hasSelection(); }
     QString SelectionText() const;
     void CopySelection() const;
 

@@ -27,7 +27,7 @@ ListView* FocusedList() {
 // Whether an Edit item has something to act on in the focused control.
 bool EditItemApplies(const std::string& name) {
     if (const ListView* list = FocusedList()) {
-        return name == "EditCopy" && !list->SelectionText().isEmpty();
+        return name == "EditCopy" && list->HasSelectedRow();
     }
     const QPlainTextEdit* editor = FocusedEditor();
     if (!editor) {
