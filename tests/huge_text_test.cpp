@@ -12,11 +12,6 @@ namespace {
 
 constexpr size_t kHuge = 4 << 20;
 
-// A report whose two blocks list `bars` bars each: many short lines.
-std::string ManyLines(int bars) {
-    return demo::ReportText(demo::Layout::A, "5012345678900", "EAN 13", bars);
-}
-
 class HugeTextTest : public WindowTest {
   protected:
     qsizetype Drawn(const Ref<class Window1>& window, int row, int column) {
@@ -25,51 +20,36 @@ class HugeTextTest : public WindowTest {
     }
 };
 
-TEST_F(HugeTextTest, TheListHoldsEveryByteAndDrawsAPrefix) {
-    const std::string oneLine = "Code reads " + std::string(kHuge, '7');
-    Store({{"1", "2018-11-04", "Box.ai", "A", "Code reads 42"},
-           {"2", "2018-11-05", "Jar.ai", "B", oneLine},
-           {"3", "2018-11-06", std::string(kHuge, 'd'), "C", ManyLines(200000)},
-           {"4", "2018-11-07", "Tin.ai", "D", "Code reads 43"}});
+TEST_F(HugeTextTest, TheListAndTheReportHoldEveryByteAndDrawAPrefix) {
+    // The second report's two blocks list 200000 bars each: many short lines.
+    const std::string manyLines =
+        demo::ReportText(demo::Layout::A, "5012345678900", "EAN 13", 200000);
+    Store({{"1", "2018-11-04", "Jar.ai", "B", "Code reads " + std::string(kHuge, '7')},
+           {"2", "2018-11-05", std::string(kHuge, 'd'), "C", manyLines},
+           {"3", "2018-11-06", "Tin.ai", "D", "Code reads 43"}});
     auto window = StartUp();
     auto list = window->Listbox1();
-    ASSERT_EQ(list->ListCount(), 4);
-    EXPECT_EQ(list->Cell(1, 2).size(), kHuge + 1) << "the read value, whole";
-    EXPECT_EQ(list->Cell(2, 1).size(), kHuge) << "the document, whole";
-    EXPECT_EQ(list->Cell(2, 2), " 5012345678900");
-    EXPECT_EQ(VariantToString(list->RowTag(3)), "4");
+    ASSERT_EQ(list->ListCount(), 3);
+    EXPECT_EQ(list->Cell(0, 2).size(), kHuge + 1) << "the read value, whole";
+    EXPECT_EQ(list->Cell(1, 1).size(), kHuge) << "the document, whole";
+    EXPECT_EQ(list->Cell(1, 2), " 5012345678900");
+    EXPECT_EQ(VariantToString(list->RowTag(2)), "3");
+    EXPECT_EQ(Drawn(window, 0, 2), static_cast<qsizetype>(kShownInCell) + 1) << "and an ellipsis";
+    EXPECT_EQ(Drawn(window, 1, 1), static_cast<qsizetype>(kShownInCell) + 1);
+    EXPECT_EQ(Drawn(window, 2, 2), 3);
 
-    EXPECT_EQ(Drawn(window, 0, 2), 3);
-    EXPECT_EQ(Drawn(window, 1, 2), static_cast<qsizetype>(kShownInCell) + 1) << "and an ellipsis";
-    EXPECT_EQ(Drawn(window, 2, 1), static_cast<qsizetype>(kShownInCell) + 1);
-    EXPECT_FALSE(View(window).grab().isNull()) << "the rows paint";
-
-    window->MainTabs()->Press(0);
-    window->MainTabs()->Press(1);
-    EXPECT_EQ(list->ListCount(), 4) << "a reload finds the same rows";
-    EXPECT_EQ(list->Cell(1, 2).size(), kHuge + 1);
-}
-
-TEST_F(HugeTextTest, TheReportHoldsAndDrawsAPrefix) {
-    const std::string report = ManyLines(200000);
-    ASSERT_GT(report.size(), kHuge / 2);
-    Store({{"1", "2018-11-04", std::string(kHuge, 'd'), "A", report}});
-    auto window = StartUp();
-    DoubleClickRow(window, 0);
+    DoubleClickRow(window, 1);
     ASSERT_EQ(window->PagePanel1()->Value(), 2);
-
-    // The report holds what it shows; the list keeps the document whole.
     EXPECT_EQ(window->TextArea1()->Text().size(), kShownInTextArea);
     EXPECT_EQ(window->Label6(7)->Text().size(), kShownInCell);
-    EXPECT_EQ(window->Label6(1)->Text(), " 5012345678900");
     const auto& pane = static_cast<QPlainTextEdit&>(*window->TextArea1()->Widget());
     EXPECT_EQ(pane.toPlainText().size(), static_cast<qsizetype>(kShownInTextArea) + 1);
     const auto& document = static_cast<QLabel&>(*window->Label6(7)->Widget());
     EXPECT_EQ(document.text().size(), static_cast<qsizetype>(kShownInCell) + 1);
-    EXPECT_EQ(window->Listbox1()->Cell(0, 1).size(), kHuge);
 
     window->PushButton2()->Push();
-    EXPECT_EQ(window->Listbox1()->ListCount(), 1);
+    EXPECT_EQ(list->ListCount(), 3) << "back on the list, the same rows";
+    EXPECT_EQ(list->Cell(1, 1).size(), kHuge);
 }
 
 struct ShownCase {
@@ -87,8 +67,7 @@ TEST_P(ShownTextTest, KeepsWholeCharactersUpToTheLimit) {
 
 INSTANTIATE_TEST_SUITE_P(
     Texts, ShownTextTest,
-    ::testing::Values(ShownCase{"Short", "abc", 3, "abc"},
-                      ShownCase{"Cut", "abcd", 3, QString("abc") + QChar(0x2026)},
+    ::testing::Values(ShownCase{"Cut", "abcd", 3, QString("abc") + QChar(0x2026)},
                       ShownCase{"CutBeforeACharacter", "a\xC3\xA9\xC3\xA9", 4,
                                 QString("a") + QChar(0xE9) + QChar(0x2026)},
                       ShownCase{"LinesEndInLineFeeds", "a\rb\r\nc", 10, "a\nb\nc"}),
