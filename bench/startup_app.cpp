@@ -1,4 +1,7 @@
-// The program's own start-up, ended the moment its window is exposed on the list page.
+// The program's own start-up, ended the moment its window is exposed and painted on the list
+// page.
+#include <QApplication>
+#include <QEvent>
 #include <QTimer>
 #include <QWidget>
 #include <QWindow>
@@ -9,13 +12,36 @@
 #include "shell/startup.h"
 #include "shell/window1.h"
 
+namespace {
+
+Ref<class Window1> WindowOnListPage() {
+    auto window = Cast<class Window1>(_GetImplicitWindow("Window1.Window1"));
+    return window && window->PagePanel1()->Value() == 1 ? window : nullptr;
+}
+
+// The yardstick's window is painted once it is exposed; so must this one be, on the list page.
+class PaintWatch : public QObject {
+  public:
+    bool painted = false;
+    bool eventFilter(QObject*, QEvent* event) override {
+        if (event->type() == QEvent::Paint && !painted && WindowOnListPage()) {
+            painted = true;
+        }
+        return false;
+    }
+};
+
+}  // namespace
+
 int main(int argc, char** argv) {
     RuntimeInit(argc, argv);
     RuntimePerformInitializers();
+    PaintWatch watch;
+    QApplication::instance()->installEventFilter(&watch);
     QTimer poll;
-    QObject::connect(&poll, &QTimer::timeout, [] {
-        auto window = Cast<class Window1>(_GetImplicitWindow("Window1.Window1"));
-        if (window && window->PagePanel1()->Value() == 1 && window->Native()->windowHandle() &&
+    QObject::connect(&poll, &QTimer::timeout, [&watch] {
+        auto window = WindowOnListPage();
+        if (window && watch.painted && window->Native()->windowHandle() &&
             window->Native()->windowHandle()->isExposed()) {
             std::_Exit(0);
         }

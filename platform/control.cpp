@@ -115,11 +115,22 @@ QWidget& Control::LiveWidget() const {
     return *widget_;
 }
 
-// Sizes are pixels, as on the desktop that the window was designed for; 0 is the default.
 void Control::ApplyFont() {
-    if (!widget_) {
-        return;
+    fontPending_ = widget_ && !IsShown();
+    if (widget_ && !fontPending_) {
+        SetWidgetFont();
     }
+}
+
+void Control::ApplyPendingFont() {
+    if (widget_ && fontPending_) {
+        fontPending_ = false;
+        SetWidgetFont();
+    }
+}
+
+// Sizes are pixels, as on the desktop that the window was designed for; 0 is the default.
+void Control::SetWidgetFont() {
     const std::string family = StringProperty("TextFont");
     QFont font = QApplication::font();
     if (!family.empty() && family != "System") {

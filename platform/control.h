@@ -58,7 +58,11 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     void SetWidget(QWidget* widget);
     // The widget, or NilObjectException once the window that showed it is gone.
     QWidget& LiveWidget() const;
+    // A control that is not shown gets its font when it is first shown, or when it is given
+    // a text to lay out: a font is looked up and loaded at its first use, which for the
+    // controls of the pages not shown at start is later or never.
     void ApplyFont();
+    void ApplyPendingFont();
     void Place();
 
   private:
@@ -71,6 +75,9 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     std::weak_ptr<::Window> window_;
     QWidget* widget_ = nullptr;
     bool widgetAdopted_ = false;
+    bool fontPending_ = false;
+
+    void SetWidgetFont();
     std::unique_ptr<QObject> context_;
 
     friend class Window;

@@ -204,6 +204,8 @@ void TextArea::SetProperty(const std::string& name, const PropertyValue& value) 
 }
 
 void TextArea::SetText(const std::string& text) {
+    // The text is laid out at once, in the font it will be shown in.
+    ApplyPendingFont();
     text_ = ShownPrefix(text, kShownInTextArea);
     static_cast<QPlainTextEdit&>(LiveWidget()).setPlainText(ShownLines(text, kShownInTextArea));
 }

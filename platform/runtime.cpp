@@ -3,8 +3,12 @@
 
 #include <QApplication>
 #include <QElapsedTimer>
+#include <QPointer>
 #include <QTimer>
 #include <QWidget>
+
+#include <utility>
+#include <vector>
 
 #ifdef __GLIBC__
 #include <malloc.h>
@@ -28,6 +32,8 @@ char* argvKept[] = {nullptr, nullptr};
 
 constexpr qint64 kOpenWaitLimitMs = 500;
 
+std::vector<QPointer<QWidget>> heldWindows;
+
 bool WindowsOnScreen() {
     for (QWidget* window : QApplication::topLevelWidgets()) {
         if (window->isVisible() && !window->testAttribute(Qt::WA_Mapped)) {
@@ -35,6 +41,30 @@ bool WindowsOnScreen() {
         }
     }
     return true;
+}
+
+// The windows shown at late start-up are first painted after the application's Open, which
+// moves the user from the page a window is built on to the first page: painting the other
+// page would only show it for an instant, at the price of its fonts and text layout.
+void HoldFirstPaint() {
+    for (QWidget* window : QApplication::topLevelWidgets()) {
+        if (window->isVisible() && !window->testAttribute(Qt::WA_Mapped)) {
+            window->setUpdatesEnabled(false);
+            heldWindows.emplace_back(window);
+        }
+    }
+}
+
+void ReleaseFirstPaint() {
+    for (const auto& window : std::exchange(heldWindows, {})) {
+        if (window) {
+            // A sync that came while the updates were held keeps its dirty areas and posts
+            // no request for them again, so the request is posted here.
+            window->setUpdatesEnabled(true);
+            QCoreApplication::postEvent(window, new QEvent(QEvent::UpdateRequest),
+                                        Qt::LowEventPriority);
+        }
+    }
 }
 
 // The application's Open brings the user to the first page, whose load may be long. It waits
@@ -45,6 +75,7 @@ void RaiseOpenOnceShown(QElapsedTimer waiting) {
         QTimer::singleShot(1, QApplication::instance(), [waiting] { RaiseOpenOnceShown(waiting); });
         return;
     }
+    ReleaseFirstPaint();
     if (auto app = CurrentApplication()) {
         RaiseEvent([app] { app->Event_Open(); });
     }
@@ -115,6 +146,7 @@ void _RuntimeRun() {
         } else if (lateStartup) {
             RaiseEvent(lateStartup);
         }
+        HoldFirstPaint();
         QElapsedTimer waiting;
         waiting.start();
         RaiseOpenOnceShown(waiting);

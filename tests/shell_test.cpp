@@ -56,6 +56,40 @@ TEST_F(ShellTest, MainLandsInListingWithAnEmptyList) {
     EXPECT_TRUE(window->Native()->isVisible());
 }
 
+// The window is built on the installation page, but the user's first sight is the list.
+TEST_F(ShellTest, MainPaintsTheListPageFirstAndNeverTheInstallationPage) {
+    struct PaintCount : QObject {
+        int installPage = 0;
+        int listPage = 0;
+        bool eventFilter(QObject* watched, QEvent* event) override {
+            auto window = Cast<class Window1>(_GetImplicitWindow("Window1.Window1"));
+            if (event->type() == QEvent::Paint && window) {
+                installPage += watched == window->PushButton1()->Widget() ? 1 : 0;
+                listPage += watched == View(window).viewport() ? 1 : 0;
+            }
+            return false;
+        }
+        QTableView& View(const Ref<class Window1>& window) {
+            return *static_cast<QTableView*>(window->Listbox1()->Widget());
+        }
+    } count;
+    QApplication::instance()->installEventFilter(&count);
+    QTimer poll;
+    QObject::connect(&poll, &QTimer::timeout, [&count] {
+        if (count.listPage > 0) {
+            QCoreApplication::exit(0);
+        }
+    });
+    poll.start(10);
+    QTimer::singleShot(5000, [] { QCoreApplication::exit(1); });
+    _Main();
+    QApplication::instance()->removeEventFilter(&count);
+
+    EXPECT_GT(count.listPage, 0);
+    EXPECT_EQ(count.installPage, 0);
+    EXPECT_EQ(StateOf(Window1()), State::Listing);
+}
+
 TEST_F(ShellTest, EitherOrderOfOpenAndLateStartupGivesOneWindowOnTheList) {
     _EarlyStartup();
     CurrentApplication()->Event_Open();

@@ -1,4 +1,5 @@
 // The window as built from its control table: one parent, indexed sets, the starting states.
+#include <QApplication>
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QTabWidget>
@@ -54,4 +55,43 @@ TEST_F(WindowTableTest, TheControlsStartAsAUserFindsThem) {
     EXPECT_EQ(window->Listbox1()->ListIndex(), -1);
     EXPECT_EQ(window->PopupMenu1()->List(0), window->PopupMenu1()->Text()) << "the prompt row";
     EXPECT_EQ(window->PopupMenu1()->ListCount(), 7);
+}
+
+// A control on a page that is not shown may get its font late, but never shows without it.
+TEST_F(WindowTableTest, EachControlShowsInItsTableFont) {
+    struct Expected {
+        Ref<Control> control;
+        long long page;
+        QString family;  // empty: the desktop's font
+        int pixelSize;
+        bool bold;
+    };
+    const QFont desktop = QApplication::font();
+    const std::vector<Expected> table = {
+        {window->PushButton1(), 0, "", -1, false},      {window->Label1(), 0, "Arial", 14, false},
+        {window->Label2(), 0, "Arial", 24, true},       {window->Label3(), 1, "Arial", 18, false},
+        {window->Listbox1(), 1, "", -1, false},         {window->Label4(), 2, "Arial", 18, false},
+        {window->Label5(6), 2, "Arial", 12, false},     {window->Label6(7), 2, "Arial", 12, false},
+        {window->TextArea1(), 2, "Courier", -1, false}, {window->PushButton2(), 2, "", -1, false},
+    };
+    for (long long page : {1, 2, 0}) {
+        window->PagePanel1()->SetValue(page);
+        for (const Expected& e : table) {
+            if (e.page != page) {
+                continue;
+            }
+            const QFont font = e.control->Widget()->font();
+            const std::string where = e.control->Name() + " on page " + std::to_string(page);
+            EXPECT_EQ(font.family(), e.family.isEmpty() ? desktop.family() : e.family) << where;
+            EXPECT_EQ(font.pixelSize(), e.family.isEmpty() ? desktop.pixelSize() : e.pixelSize)
+                << where;
+            EXPECT_EQ(font.bold(), e.bold) << where;
+        }
+    }
+}
+
+TEST_F(WindowTableTest, ATextAreaLaysItsTextOutInItsOwnFontEvenWhileHidden) {
+    ASSERT_FALSE(window->TextArea2()->IsShown());
+    window->TextArea2()->SetText("Bar 1 660");
+    EXPECT_EQ(window->TextArea2()->Widget()->font().family(), "Courier");
 }
