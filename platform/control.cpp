@@ -9,6 +9,7 @@
 
 #include "platform/main_thread.h"
 #include "platform/qt_color.h"
+#include "platform/qt_font.h"
 #include "platform/window.h"
 
 Control::Control() : context_(std::make_unique<QObject>()) {}
@@ -131,12 +132,8 @@ void Control::ApplyPendingFont() {
 
 // Sizes are pixels, as on the desktop that the window was designed for; 0 is the default.
 void Control::SetWidgetFont() {
-    const std::string family = StringProperty("TextFont");
     QFont font = QApplication::font();
-    if (!family.empty() && family != "System") {
-        font.setFamily(QString::fromStdString(family));
-        font.setStyleHint(family == "Courier" ? QFont::TypeWriter : QFont::SansSerif);
-    }
+    SetFontFamily(font, StringProperty("TextFont"));
     if (const auto* size = Property("TextSize"); size && std::get<float>(*size) > 0) {
         font.setPixelSize(static_cast<int>(std::lround(std::get<float>(*size))));
     }

@@ -9,6 +9,7 @@
 #include <cmath>
 
 #include "platform/qt_color.h"
+#include "platform/qt_font.h"
 
 Graphics::Graphics(QPainter& painter, int width, int height, Color ground)
     : painter_(painter), width_(width), height_(height), ground_(ground) {
@@ -68,9 +69,7 @@ void Graphics::DrawLine(double x1, double y1, double x2, double y2) {
 void Graphics::DrawString(const std::string& text, double x, double y, double wrapWidth,
                           bool /*condense*/) {
     QFont font = painter_.font();
-    if (!TextFont.empty() && TextFont != "System") {
-        font.setFamily(QString::fromStdString(TextFont));
-    }
+    SetFontFamily(font, TextFont);
     if (TextSize > 0) {
         font.setPixelSize(static_cast<int>(std::lround(TextSize)));
     }

@@ -2,7 +2,6 @@
 #include "platform/runtime.h"
 
 #include <QApplication>
-#include <QElapsedTimer>
 #include <QPointer>
 #include <QTimer>
 #include <QWidget>
@@ -67,19 +66,53 @@ void ReleaseFirstPaint() {
     }
 }
 
-// The application's Open brings the user to the first page, whose load may be long. It waits
-// until the windows are on screen, half a second at most, so that the yield of that load has
-// a window to paint the rows on as they come.
-void RaiseOpenOnceShown(QElapsedTimer waiting) {
-    if (!WindowsOnScreen() && !waiting.hasExpired(kOpenWaitLimitMs)) {
-        QTimer::singleShot(1, QApplication::instance(), [waiting] { RaiseOpenOnceShown(waiting); });
-        return;
-    }
+void RaiseOpen() {
     ReleaseFirstPaint();
     if (auto app = CurrentApplication()) {
         RaiseEvent([app] { app->Event_Open(); });
     }
 }
+
+// The application's Open brings the user to the first page, whose load may be long. It waits
+// until the windows are on screen, half a second at most, so that the yield of that load has
+// a window to paint the rows on as they come. A window is on screen once Qt has handled the
+// expose that maps it, so each expose is followed by a look.
+class OpenOnceShown : public QObject {
+  public:
+    OpenOnceShown() : QObject(QApplication::instance()) {
+        QApplication::instance()->installEventFilter(this);
+        QTimer::singleShot(kOpenWaitLimitMs, this, [this] { Raise(); });
+        if (WindowsOnScreen()) {
+            Raise();
+        }
+    }
+
+    bool eventFilter(QObject*, QEvent* event) override {
+        if (event->type() == QEvent::Expose) {
+            QMetaObject::invokeMethod(
+                this,
+                [this] {
+                    if (WindowsOnScreen()) {
+                        Raise();
+                    }
+                },
+                Qt::QueuedConnection);
+        }
+        return false;
+    }
+
+  private:
+    void Raise() {
+        if (std::exchange(raised_, true)) {
+            return;
+        }
+        QApplication::instance()->removeEventFilter(this);
+        deleteLater();
+        RaiseOpen();
+    }
+
+    bool raised_ = false;
+};
 }  // namespace
 
 void RuntimeInit(int argc, char** argv) {
@@ -147,9 +180,7 @@ void _RuntimeRun() {
             RaiseEvent(lateStartup);
         }
         HoldFirstPaint();
-        QElapsedTimer waiting;
-        waiting.start();
-        RaiseOpenOnceShown(waiting);
+        new OpenOnceShown;
     });
     exitStatus = QApplication::exec();
 }
