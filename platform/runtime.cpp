@@ -14,6 +14,7 @@
 #endif
 
 #include "platform/application.h"
+#include "platform/application_style.h"
 #include "platform/folder_item.h"
 #include "platform/window.h"
 
@@ -129,6 +130,7 @@ void RuntimeInit(int argc, char** argv) {
     argvKept[0] = argc > 0 && argv[0] ? argv[0] : fallbackName;
     argcKept = 1;
     ownApplication = std::make_unique<QApplication>(argcKept, argvKept);
+    QApplication::setStyle(new ApplicationStyle);
     // The desktop ties the window to the installed desktop entry, and so to its icon, by this
     // name; the entry is named after the executable.
     QGuiApplication::setDesktopFileName(QCoreApplication::applicationName());

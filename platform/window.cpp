@@ -74,6 +74,7 @@ void Window::Constructor() {
 
     Layout();
     CreateControls();
+    built_ = true;
     UpdateVisibility();
 
     openWindows.push_back(shared_from_this());
@@ -169,7 +170,12 @@ QWidget* Window::Native() const {
     return native_;
 }
 
+// While the controls are being built, each page, parent and visibility property would show and
+// hide them all again; the window shows the right ones once, when all are there.
 void Window::UpdateVisibility() {
+    if (!built_) {
+        return;
+    }
     for (const auto& control : controls_) {
         if (QWidget* widget = control->Widget()) {
             const bool shown = control->IsShown();

@@ -69,6 +69,7 @@ class Window : public PropertyObject, public std::enable_shared_from_this<Window
     Ref<::MenuBar> menuBar_;
     Color backColor_ = 0xFFFFFF;
     bool open_ = false;
+    bool built_ = false;
 };
 
 // Releases every open window; the run-time does so before the Qt application goes.

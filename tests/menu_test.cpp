@@ -1,12 +1,15 @@
-// The menu bar: its structure, its native form in the window, and quitting.
+// The menu bar: its structure, its native form in the window, its style's icon, and quitting.
 #include <QAction>
+#include <QApplication>
 #include <QClipboard>
 #include <QGuiApplication>
 #include <QMainWindow>
 #include <QMenu>
 #include <QMenuBar>
 #include <QPlainTextEdit>
+#include <QStyle>
 
+#include "platform/application_style.h"
 #include "platform/runtime.h"
 #include "shell/main_menu_bar.h"
 #include "shell/startup.h"
@@ -69,4 +72,18 @@ TEST_F(MenuTest, QuitEndsTheEventLoopAndClosesTheWindow) {
     EXPECT_EQ(QCoreApplication::exec(), 0);
     EXPECT_FALSE(window->IsOpen());
     EXPECT_TRUE(_GetImplicitWindow("Window1.Window1").IsNil());
+}
+
+// The menu bar's overflow icon, handed over unread, draws as the desktop style's own; the
+// other icons come from that style unchanged.
+TEST(ApplicationStyleTest, IconsLookAsTheDesktopStylesOwn) {
+    ApplicationStyle style;
+    QStyle* desktop = QApplication::style();
+    for (auto which : {QStyle::SP_ToolBarHorizontalExtensionButton, QStyle::SP_MessageBoxWarning}) {
+        const QIcon icon = style.standardIcon(which);
+        ASSERT_FALSE(icon.isNull()) << which;
+        EXPECT_EQ(icon.pixmap(QSize(16, 16)).toImage(),
+                  desktop->standardIcon(which).pixmap(QSize(16, 16)).toImage())
+            << which;
+    }
 }
