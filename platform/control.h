@@ -76,10 +76,9 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     QWidget* widget_ = nullptr;
     bool widgetAdopted_ = false;
     bool fontPending_ = false;
-
-    void SetWidgetFont();
     std::unique_ptr<QObject> context_;
 
     friend class Window;
     Ref<Control> Parent() const;
+    void SetWidgetFont();
 };
