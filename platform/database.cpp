@@ -32,9 +32,6 @@ bool IsBlankTail(sqlite3* db, const char* tail) {
     return true;
 }
 
-// A field that held a huge text gives its memory back rather than keep it for small ones.
-constexpr size_t kKeptCapacity = 1 << 16;
-
 // A path as the path of a file: URI, with the characters that would end or escape it encoded.
 std::string UriPath(const std::string& path) {
     static const char* const kHex = "0123456789ABCDEF";
@@ -67,11 +64,18 @@ bool IsWalWithoutLog(const std::filesystem::path& file) {
 
 }  // namespace
 
-void DatabaseField::Assign(const char* text, size_t bytes) {
-    if (value_.capacity() > kKeptCapacity && bytes <= kKeptCapacity) {
-        value_ = std::string();
+void DatabaseField::Refer(const char* text, size_t bytes) {
+    if (!kept_.empty()) {
+        kept_ = std::string();  // a huge text kept before goes back to the system
     }
-    value_.assign(text, bytes);
+    value_ = std::string_view(text, bytes);
+}
+
+void DatabaseField::Keep() {
+    if (value_.data() != kept_.data()) {
+        kept_.assign(value_);
+        value_ = kept_;
+    }
 }
 
 RecordSet::RecordSet(std::shared_ptr<sqlite3> connection, sqlite3_stmt* statement, bool atEnd)
@@ -94,12 +98,12 @@ Ref<DatabaseField> RecordSet::Field(std::string_view name) const {
     }
     int column = -1;
     // A loop asks the same names in the same order: the one behind the last is tried first.
-    if (nextAsked_ < asked_.size() && asked_[nextAsked_].first == name) {
+    if (nextAsked_ < asked_.size() && SameBytes(asked_[nextAsked_].first, name)) {
         column = asked_[nextAsked_].second;
     } else {
         nextAsked_ = 0;
         for (; nextAsked_ < asked_.size(); ++nextAsked_) {
-            if (asked_[nextAsked_].first == name) {
+            if (SameBytes(asked_[nextAsked_].first, name)) {
                 column = asked_[nextAsked_].second;
                 break;
             }
@@ -121,20 +125,33 @@ Ref<DatabaseField> RecordSet::Field(std::string_view name) const {
     const auto bytes = text ? static_cast<size_t>(sqlite3_column_bytes(statement_, column)) : 0;
     std::shared_ptr<DatabaseField>& field = fields_[static_cast<size_t>(column)];
     if (!field || field.use_count() > 1) {
-        field = std::make_shared<DatabaseField>();  // the old one stays with its holder
+        if (field) {
+            field->Keep();  // it stays with its holder
+        }
+        field = std::make_shared<DatabaseField>();
     }
-    field->Assign(text ? text : "", bytes);
+    field->Refer(text ? text : "", bytes);
     return Ref<DatabaseField>(field);
 }
 
 // A failure while stepping ends the rows, as the end of the result would.
 void RecordSet::MoveNext() {
     if (statement_ && !atEnd_) {
+        KeepHeldFields();
         atEnd_ = sqlite3_step(statement_) != SQLITE_ROW;
     }
 }
 
+void RecordSet::KeepHeldFields() {
+    for (const auto& field : fields_) {
+        if (field && field.use_count() > 1) {
+            field->Keep();
+        }
+    }
+}
+
 void RecordSet::Close() {
+    KeepHeldFields();
     if (statement_) {
         sqlite3_finalize(statement_);
         statement_ = nullptr;

@@ -17,16 +17,23 @@ struct sqlite3_stmt;
 class DatabaseField {
   public:
     DatabaseField() = default;
-    explicit DatabaseField(std::string value) : value_(std::move(value)) {}
-    // The column's value as text; a NULL is the empty text.
-    std::string StringValue() const { return value_; }
-    operator const std::string&() const { return value_; }
+    DatabaseField(const DatabaseField&) = delete;
+    DatabaseField& operator=(const DatabaseField&) = delete;
 
-    // Platform use: the record set refills a field that nobody holds any more.
-    void Assign(const char* text, size_t bytes);
+    // The column's value as text; a NULL is the empty text.
+    std::string StringValue() const { return std::string(value_); }
+    operator std::string() const { return StringValue(); }
+    operator std::string_view() const { return value_; }
+
+    // Platform use. A field that nobody else holds is only a view of the current row's text,
+    // so a loop over a million rows copies none of it; a held field keeps its own copy before
+    // the row goes.
+    void Refer(const char* text, size_t bytes);
+    void Keep();
 
   private:
-    std::string value_;
+    std::string kept_;
+    std::string_view value_;
 };
 
 class RecordSet {
@@ -44,6 +51,8 @@ class RecordSet {
     void Close();
 
   private:
+    void KeepHeldFields();
+
     std::shared_ptr<sqlite3> connection_;
     sqlite3_stmt* statement_;
     bool atEnd_;

@@ -195,10 +195,11 @@ std::string Listbox::Cell(long long row, long long column) const {
     return std::string(Rows().Store().Field(static_cast<size_t>(row), static_cast<int>(column)));
 }
 
-void Listbox::SetCell(long long row, long long column, const std::string& text) {
+void Listbox::SetCell(long long row, long long column, std::string_view text) {
     CheckCell(row, column);
-    Rows().Store().SetField(static_cast<size_t>(row), static_cast<int>(column), text);
-    Rows().CellChanged(static_cast<size_t>(row), static_cast<int>(column));
+    ListModel& rows = Rows();
+    rows.Store().SetField(static_cast<size_t>(row), static_cast<int>(column), text);
+    rows.CellChanged(static_cast<size_t>(row), static_cast<int>(column));
 }
 
 Variant Listbox::RowTag(long long row) const {
@@ -209,7 +210,7 @@ Variant Listbox::RowTag(long long row) const {
 
 void Listbox::SetRowTag(long long row, const Variant& tag) {
     CheckCell(row, 0);
-    Rows().Store().SetField(static_cast<size_t>(row), Rows().Columns(), VariantToString(tag));
+    Rows().Store().SetField(static_cast<size_t>(row), Rows().Columns(), tag.text);
 }
 
 long long Listbox::ListIndex() const {
@@ -247,7 +248,9 @@ ListModel& Listbox::Rows() const {
 }
 
 void Listbox::CheckCell(long long row, long long column) const {
-    if (row < 0 || row >= ListCount() || column < 0 || column >= Rows().Columns()) {
+    const ListModel& rows = Rows();
+    if (row < 0 || static_cast<size_t>(row) >= rows.Store().Count() || column < 0 ||
+        column >= rows.Columns()) {
         throw OutOfBoundsException("List cell out of bounds");
     }
 }

@@ -5,6 +5,7 @@
 #include <functional>
 #include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "platform/control.h"
@@ -27,7 +28,7 @@ class Listbox : public Control {
     long long LastIndex() const;
     long long ListCount() const;
     std::string Cell(long long row, long long column) const;
-    void SetCell(long long row, long long column, const std::string& text);
+    void SetCell(long long row, long long column, std::string_view text);
     Variant RowTag(long long row) const;
     void SetRowTag(long long row, const Variant& tag);
     // The selected row, or -1.

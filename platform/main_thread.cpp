@@ -8,7 +8,9 @@
 
 void RequireMainThread() {
     const QCoreApplication* application = QCoreApplication::instance();
-    if (application && QThread::currentThread() != application->thread()) {
+    // Asked for every row of a long load: each thread looks its own object up once.
+    thread_local QThread* const current = QThread::currentThread();
+    if (application && current != application->thread()) {
         throw ThreadAccessingUIException(
             "A thread has attempted to manipulate a user interface element. This can only be "
             "done from the application's main thread.");

@@ -66,9 +66,6 @@ std::string_view FieldOf(const char* record, int field) {
 }
 
 constexpr uint64_t kOffsetMask = 0xFFFFFFFF;
-// Room left behind an oversized record, so that the small fields that follow it in its row
-// are written in place.
-constexpr size_t kHeadroom = 4096;
 
 }  // namespace
 
@@ -78,26 +75,30 @@ void RowStore::SetFieldCount(int fieldCount) {
 }
 
 void RowStore::AddRow() {
-    const auto fields = static_cast<size_t>(fieldCount_);
-    std::memset(Reserve(fields), 0, fields);
-    if (!inOrder_) {
-        places_.push_back(lastRecord_);
-    } else if (count_ % kStride == 0) {
-        marks_.push_back(lastRecord_);
+    CommitTail();
+    tail_.resize(static_cast<size_t>(fieldCount_));
+    for (std::string& text : tail_) {
+        text.clear();
     }
+    tailOpen_ = true;
     ++count_;
 }
 
 std::string_view RowStore::Field(size_t row, int field) const {
+    if (tailOpen_ && row + 1 == count_) {
+        return tail_[static_cast<size_t>(field)];
+    }
     return FieldOf(RecordAt(Location(row)), field);
 }
 
 void RowStore::SetField(size_t row, int field, std::string_view text) {
-    const uint64_t place = Location(row);
-    const bool lastWritten = place == lastRecord_;
-    if (lastWritten && SetTailField(field, text)) {
+    if (tailOpen_ && row + 1 == count_) {
+        tail_[static_cast<size_t>(field)].assign(text);
         return;
     }
+    CommitTail();
+    const uint64_t place = Location(row);
+    const bool lastWritten = place == lastRecord_;
     if (!lastWritten) {
         MakePlaces();  // the new record will stand behind the last one, out of order
     }
@@ -122,33 +123,29 @@ void RowStore::SetField(size_t row, int field, std::string_view text) {
     ReleaseIfHuge(scratch_, kChunkSize);
 }
 
-// Filling the last row from left to right: when every field behind `field` is still empty,
-// the record is cut at `field` and written on from there, without copying what stands ahead.
-bool RowStore::SetTailField(int field, std::string_view text) {
-    Chunk& chunk = chunks_.back();
-    char* record = chunk.bytes.get() + (lastRecord_ & kOffsetMask);
-    const char* at = record;
-    for (int i = 0; i < field; ++i) {
-        at += GetLength(at);
+// The row being filled becomes one record behind the last, in a single pass.
+void RowStore::CommitTail() {
+    if (!tailOpen_) {
+        return;
     }
-    char* fieldStart = const_cast<char*>(at);
-    GetLength(at);  // the old value of the field itself may be anything
-    const auto emptyBehind = static_cast<size_t>(fieldCount_ - field - 1);
-    for (size_t i = 0; i < emptyBehind; ++i) {
-        if (*at++ != 0) {
-            return false;
-        }
+    tailOpen_ = false;
+    size_t bytes = 0;
+    for (const std::string& text : tail_) {
+        bytes += LengthSize(text.size()) + text.size();
     }
-    const auto start = static_cast<size_t>(fieldStart - chunk.bytes.get());
-    const size_t end = start + LengthSize(text.size()) + text.size() + emptyBehind;
-    if (end > chunk.size) {
-        return false;
+    char* out = Reserve(bytes);
+    for (std::string& text : tail_) {
+        out = PutLength(out, text.size());
+        std::memcpy(out, text.data(), text.size());
+        out += text.size();
+        ReleaseIfHuge(text, kChunkSize);
     }
-    char* out = PutLength(fieldStart, text.size());
-    std::memcpy(out, text.data(), text.size());
-    std::memset(out + text.size(), 0, emptyBehind);
-    chunk.used = end;
-    return true;
+    const size_t row = count_ - 1;
+    if (!inOrder_) {
+        places_.push_back(lastRecord_);
+    } else if (row % kStride == 0) {
+        marks_.push_back(lastRecord_);
+    }
 }
 
 // The last row's record is always the last one written; a chunk that it leaves empty goes.
@@ -160,6 +157,8 @@ void RowStore::DropLastRecord() {
 }
 
 void RowStore::Clear() {
+    tail_ = {};
+    tailOpen_ = false;
     chunks_.clear();
     chunks_.shrink_to_fit();
     count_ = 0;
@@ -171,6 +170,7 @@ void RowStore::Clear() {
 }
 
 std::vector<uint32_t> RowStore::SortBy(int field, bool descending) {
+    CommitTail();
     MakePlaces();
     std::vector<uint32_t> order(count_);
     std::iota(order.begin(), order.end(), 0u);
@@ -190,7 +190,7 @@ std::vector<uint32_t> RowStore::SortBy(int field, bool descending) {
 // Room for a record of `bytes` behind the last one; lastRecord_ is its location.
 char* RowStore::Reserve(size_t bytes) {
     if (chunks_.empty() || chunks_.back().used + bytes > chunks_.back().size) {
-        const size_t size = bytes > kChunkSize ? bytes + kHeadroom : kChunkSize;
+        const size_t size = std::max(bytes, kChunkSize);
         chunks_.push_back({std::make_unique_for_overwrite<char[]>(size), size, 0});
     }
     Chunk& chunk = chunks_.back();
@@ -203,7 +203,8 @@ uint64_t RowStore::Location(size_t row) const {
     if (!inOrder_) {
         return places_[row];
     }
-    if (row + 1 == count_) {
+    const size_t written = tailOpen_ ? count_ - 1 : count_;  // the rows that have a record
+    if (row + 1 == written) {
         return lastRecord_;
     }
     uint64_t at = 0;

@@ -38,7 +38,7 @@ class RowStore {
     };
 
     char* Reserve(size_t bytes);
-    bool SetTailField(int field, std::string_view text);
+    void CommitTail();
     void DropLastRecord();
     uint64_t Location(size_t row) const;
     uint64_t NextLocation(uint64_t location) const;
@@ -57,4 +57,8 @@ class RowStore {
     mutable size_t foundRow_ = SIZE_MAX;
     mutable uint64_t foundAt_ = 0;
     std::string scratch_;  // the record being rebuilt, kept to spare an allocation per cell
+    // The last row while it is filled: its fields wait here and become one record when the
+    // next row comes, so filling a row copies each text once.
+    std::vector<std::string> tail_;
+    bool tailOpen_ = false;
 };

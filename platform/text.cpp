@@ -6,8 +6,10 @@
 
 #include <locale.h>
 #include <algorithm>
+#include <array>
 #include <charconv>
 #include <cmath>
+#include <cstdint>
 #include <cstdlib>
 #include <cstring>
 #include <limits>
@@ -25,13 +27,31 @@ struct Match {
     bool Found() const { return position != std::string_view::npos; }
 };
 
+// Eight bytes at a time: every search asks this of its separator.
 bool IsAscii(std::string_view text) {
-    return std::all_of(text.begin(), text.end(),
-                       [](char c) { return static_cast<unsigned char>(c) < 0x80; });
+    uint64_t bits = 0;
+    size_t at = 0;
+    for (; at + 8 <= text.size(); at += 8) {
+        uint64_t word = 0;
+        std::memcpy(&word, text.data() + at, 8);
+        bits |= word;
+    }
+    for (; at < text.size(); ++at) {
+        bits |= static_cast<unsigned char>(text[at]);
+    }
+    return (bits & 0x8080808080808080) == 0;
 }
 
+constexpr std::array<char, 256> kFoldedAscii = [] {
+    std::array<char, 256> table{};
+    for (int c = 0; c < 256; ++c) {
+        table[static_cast<size_t>(c)] = static_cast<char>(c >= 'A' && c <= 'Z' ? c + 32 : c);
+    }
+    return table;
+}();
+
 char FoldAscii(char c) {
-    return (c >= 'A' && c <= 'Z') ? static_cast<char>(c + 32) : c;
+    return kFoldedAscii[static_cast<unsigned char>(c)];
 }
 
 bool IsContinuation(unsigned char byte) {
@@ -72,20 +92,29 @@ char32_t Fold(char32_t code) {
     return code < 0x110000 ? QChar::toCaseFolded(code) : code;
 }
 
+// The first place from `from` to `last` that holds `c`; npos when there is none.
+size_t NextByte(std::string_view source, size_t from, size_t last, char c) {
+    if (from > last) {
+        return std::string_view::npos;
+    }
+    const void* hit = std::memchr(source.data() + from, c, last - from + 1);
+    return hit ? static_cast<size_t>(static_cast<const char*>(hit) - source.data())
+               : std::string_view::npos;
+}
+
+// memchr finds the candidates: for a letter, in each of its two cases, and the nearer one is
+// tried first. Texts are scanned at memchr's speed, not a byte at a time.
 Match FindAscii(std::string_view source, size_t from, std::string_view find) {
-    const char first = FoldAscii(find[0]);
-    const bool firstIsLetter = first >= 'a' && first <= 'z';
+    const char lower = FoldAscii(find[0]);
+    const bool isLetter = lower >= 'a' && lower <= 'z';
+    const char upper = static_cast<char>(lower - 32);
     const size_t last = source.size() - find.size();
-    for (size_t at = from; at <= last; ++at) {
-        if (!firstIsLetter) {
-            // A separator such as the carriage return: let memchr find the candidates.
-            const void* hit = std::memchr(source.data() + at, first, last - at + 1);
-            if (!hit) {
-                return {};
-            }
-            at = static_cast<size_t>(static_cast<const char*>(hit) - source.data());
-        } else if ((source[at] | 0x20) != first) {  // a letter in either case
-            continue;
+    size_t nextLower = NextByte(source, from, last, lower);
+    size_t nextUpper = isLetter ? NextByte(source, from, last, upper) : std::string_view::npos;
+    while (true) {
+        const size_t at = std::min(nextLower, nextUpper);
+        if (at == std::string_view::npos) {
+            return {};
         }
         size_t i = 1;
         while (i < find.size() && FoldAscii(source[at + i]) == FoldAscii(find[i])) {
@@ -94,8 +123,12 @@ Match FindAscii(std::string_view source, size_t from, std::string_view find) {
         if (i == find.size()) {
             return {at, find.size()};
         }
+        if (at == nextLower) {
+            nextLower = NextByte(source, at + 1, last, lower);
+        } else {
+            nextUpper = NextByte(source, at + 1, last, upper);
+        }
     }
-    return {};
 }
 
 Match FindFolded(std::string_view source, size_t from, std::string_view find) {
@@ -161,25 +194,29 @@ bool IsTrimmed(char c) {
 
 }  // namespace
 
-std::string NthField(std::string_view source, std::string_view separator, long long n) {
+std::string_view NthFieldView(std::string_view source, std::string_view separator, long long n) {
     if (n < 1) {
         return {};
     }
     if (separator.empty()) {
-        return n == 1 ? std::string(source) : std::string();
+        return n == 1 ? source : std::string_view();
     }
     size_t fieldStart = 0;
     for (long long field = 1;; ++field) {
         const Match match = Find(source, fieldStart, separator);
         if (field == n) {
             const size_t end = match.Found() ? match.position : source.size();
-            return std::string(source.substr(fieldStart, end - fieldStart));
+            return source.substr(fieldStart, end - fieldStart);
         }
         if (!match.Found()) {
             return {};
         }
         fieldStart = match.position + match.length;
     }
+}
+
+std::string NthField(std::string_view source, std::string_view separator, long long n) {
+    return std::string(NthFieldView(source, separator, n));
 }
 
 long long CountFields(std::string_view source, std::string_view separator) {

@@ -6,6 +6,8 @@
 #include <string_view>
 
 std::string NthField(std::string_view source, std::string_view separator, long long n);
+// NthField without the copy: a view into `source`.
+std::string_view NthFieldView(std::string_view source, std::string_view separator, long long n);
 long long CountFields(std::string_view source, std::string_view separator);
 // Position of the first occurrence of `find` at or after character `start` (0 or 1 mean the
 // beginning), counted in characters from 1; 0 when there is none or `find` is empty.
@@ -18,6 +20,19 @@ std::string Chr(long long code);
 // 0 when the two texts are equal, case aside; otherwise the sign of their order.
 int RuntimeStringCompare(std::string_view first, std::string_view second);
 bool TextEquals(std::string_view first, std::string_view second);
+// Byte for byte, inline and without a call to memcmp: for short names that a loop asks for
+// again and again.
+inline bool SameBytes(std::string_view first, std::string_view second) {
+    if (first.size() != second.size()) {
+        return false;
+    }
+    for (size_t i = 0; i < first.size(); ++i) {
+        if (first[i] != second[i]) {
+            return false;
+        }
+    }
+    return true;
+}
 
 // The run-time's conversion of a double to a 64-bit integer: towards zero, saturating at the
 // ends of the range, and 0 for a NaN.

@@ -16,6 +16,7 @@
 #include "platform/menu.h"
 #include "platform/native_window.h"
 #include "platform/qt_color.h"
+#include "platform/text.h"
 
 namespace {
 std::vector<std::shared_ptr<Window>> openWindows;
@@ -135,14 +136,19 @@ void Window::_AddControl(const Ref<Control>& control, const std::string& name) {
     control->AttachTo(shared_from_this());
 }
 
-Ref<Control> Window::_ControlByName(const std::string& name) const {
+const Ref<Control>& Window::_ControlByName(std::string_view name) const {
+    static const Ref<Control> kNone;
     RequireMainThread();
-    for (const auto& control : controls_) {
-        if (control->Name() == name) {
-            return control;
+    if (lastFound_ < controls_.size() && SameBytes(controls_[lastFound_]->Name(), name)) {
+        return controls_[lastFound_];
+    }
+    for (size_t i = 0; i < controls_.size(); ++i) {
+        if (SameBytes(controls_[i]->Name(), name)) {
+            lastFound_ = i;
+            return controls_[i];
         }
     }
-    return nullptr;
+    return kNone;
 }
 
 Ref<Control> Window::_ControlByNameIndex(const std::string& name, long long index) const {

@@ -3,6 +3,7 @@
 
 #include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "platform/color.h"
@@ -39,12 +40,13 @@ class Window : public PropertyObject, public std::enable_shared_from_this<Window
 
     // Enters the control under its name; its index, if any, it brings along.
     void _AddControl(const Ref<Control>& control, const std::string& name);
-    Ref<Control> _ControlByName(const std::string& name) const;
+    // Nil when there is no such control.
+    const Ref<Control>& _ControlByName(std::string_view name) const;
     Ref<Control> _ControlByNameIndex(const std::string& name, long long index) const;
     const std::vector<Ref<Control>>& Controls() const { return controls_; }
     // A control by name, cast to its class as the window's accessors give it.
     template <class T>
-    Ref<T> ControlAs(const std::string& name) const {
+    Ref<T> ControlAs(std::string_view name) const {
         return Cast<T>(_ControlByName(name));
     }
     template <class T>
@@ -66,6 +68,8 @@ class Window : public PropertyObject, public std::enable_shared_from_this<Window
     NativeWindow* native_ = nullptr;
     QWidget* client_ = nullptr;
     std::vector<Ref<Control>> controls_;
+    // The control found by name last: a handler's loop asks for the same one row after row.
+    mutable size_t lastFound_ = 0;
     Ref<::MenuBar> menuBar_;
     Color backColor_ = 0xFFFFFF;
     bool open_ = false;

@@ -1,75 +1,97 @@
 // Readers of the report text.
 #include "results/report_text.h"
 
+#include <optional>
+#include <string_view>
+
 #include "platform/text.h"
 
 namespace {
-const std::string kLineEnd = Chr(13);
 const std::string kCodeReads = "Code reads";
 const std::string kCodeIs = "Code is";
 const std::string kMeasurements = "Actual Measurements = +- mic 0";
 const std::string kDeviances = "Bar/Space Deviances = +- mic 0";
+
+// The readers look at views into the text and copy only the value they return: the list
+// reads a value from every row of the store. Line n counts from 1; past the last line it is
+// the empty text. A line end has no case, so it is found as a plain byte.
+std::string_view LineView(std::string_view text, long long n) {
+    for (; n > 1; --n) {
+        const size_t end = text.find('\r');
+        if (end == std::string_view::npos) {
+            return {};
+        }
+        text.remove_prefix(end + 1);
+    }
+    return text.substr(0, text.find('\r'));
+}
+
+// The text behind the first `marker` on `line`, case aside, up to its next occurrence; none
+// when the line lacks the marker.
+std::optional<std::string_view> Behind(std::string_view line, std::string_view marker) {
+    const std::string_view before = NthFieldView(line, marker, 1);
+    if (before.size() == line.size()) {
+        return std::nullopt;
+    }
+    // The markers are ASCII, so what matches one, case aside, is as long as the marker.
+    return NthFieldView(line.substr(before.size() + marker.size()), marker, 1);
+}
+
+std::string ValueBehind(std::string_view line, std::string_view marker) {
+    return std::string(Behind(line, marker).value_or(std::string_view()));
+}
 }  // namespace
 
-std::string Line(const std::string& text, long long n) {
-    return NthField(text, kLineEnd, n);
-}
-
-std::string ValueBehind(const std::string& line, const std::string& marker) {
-    return NthField(line, marker, 2);
-}
-
-std::string ListReadValue(const std::string& text) {
-    const std::string first = Line(text, 1);
-    if (InStr(0, first, kCodeReads) > 0) {
-        return ValueBehind(first, kCodeReads);
+std::string ListReadValue(std::string_view text) {
+    if (const auto value = Behind(LineView(text, 1), kCodeReads)) {
+        return std::string(*value);
     }
-    return ValueBehind(Line(text, 2), kCodeReads);
+    return ValueBehind(LineView(text, 2), kCodeReads);
 }
 
 std::string ReportReadValue(const std::string& text) {
-    std::string value = ValueBehind(Line(text, 1), kCodeReads);
+    std::string value = ValueBehind(LineView(text, 1), kCodeReads);
     if (value.empty()) {
-        value = ValueBehind(Line(text, 2), kCodeReads);
+        value = ValueBehind(LineView(text, 2), kCodeReads);
     }
     return value;
 }
 
 std::string ReportCodeType(const std::string& text) {
-    std::string value = ValueBehind(Line(text, 2), kCodeIs);
+    std::string value = ValueBehind(LineView(text, 2), kCodeIs);
     if (value.empty()) {
-        value = ValueBehind(Line(text, 1), kCodeIs);
+        value = ValueBehind(LineView(text, 1), kCodeIs);
     }
     return value;
 }
 
 bool PassesReportTest(const std::string& text) {
-    const std::string first = Line(text, 1);
-    return InStr(0, first, kCodeReads) > 0 || InStr(0, first, kCodeIs) > 0;
+    const std::string_view first = LineView(text, 1);
+    return Behind(first, kCodeReads) || Behind(first, kCodeIs);
 }
 
 std::string SymbolLength(const std::string& text) {
-    return ValueBehind(Line(text, 4), "Symbol Length");
+    return ValueBehind(LineView(text, 4), "Symbol Length");
 }
 
 std::string Scale(const std::string& text) {
-    return ValueBehind(Line(text, 5), "Code is Sized at");
+    return ValueBehind(LineView(text, 5), "Code is Sized at");
 }
 
 std::string Bwr(const std::string& text) {
-    return ValueBehind(Line(text, 6), "BWR Measured As");
+    return ValueBehind(LineView(text, 6), "BWR Measured As");
 }
 
 std::string BarDeviance(const std::string& text) {
-    return ValueBehind(Line(text, 7), "Bar Deviance");
+    return ValueBehind(LineView(text, 7), "Bar Deviance");
 }
 
 std::string FreeLine(const std::string& text) {
-    return Line(text, 8);
+    return std::string(LineView(text, 8));
 }
 
 std::string MeasurementsBlock(const std::string& text) {
-    return NthField(NthField(text, kMeasurements, 2), kDeviances, 1);
+    return std::string(NthFieldView(NthFieldView(text, kMeasurements, 2), kDeviances, 1));
 }
 
 // Taken from the whole text, not from behind the measurements marker.

@@ -3,14 +3,10 @@
 #pragma once
 
 #include <string>
-
-// Line n, from 1; the empty text past the last line.
-std::string Line(const std::string& text, long long n);
-// The text behind the first occurrence of `marker` on `line`, up to its next occurrence.
-std::string ValueBehind(const std::string& line, const std::string& marker);
+#include <string_view>
 
 // The read value as the list shows it: from line 1 if "Code reads" is there, else line 2.
-std::string ListReadValue(const std::string& text);
+std::string ListReadValue(std::string_view text);
 // The read value and the code type as the report shows them; they try lines 1 and 2 in
 // opposite orders.
 std::string ReportReadValue(const std::string& text);
