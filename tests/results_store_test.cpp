@@ -131,6 +131,24 @@ TEST_F(StoreTest, ReadsEveryRowAsTextAndNullAsEmptyText) {
     EXPECT_TRUE(rows->Eof());
 }
 
+// A field is a view of its row until the cursor moves; one still held keeps its own text.
+TEST_F(StoreTest, AFieldHeldPastItsRowKeepsThatRowsText) {
+    Write(demo::InventedResults(3, false));
+    SQLiteDatabase db;
+    auto rows = OpenStore(db, kListQuery);
+    ASSERT_FALSE(rows.IsNil());
+    const Ref<DatabaseField> first = rows->Field("id");
+    const Ref<DatabaseField> again = rows->Field("id");
+    const Ref<DatabaseField> document = rows->Field("document");
+    const std::string firstDocument = *document;
+    rows->MoveNext();
+    EXPECT_EQ(rows->Field("id")->StringValue(), "2");
+    EXPECT_EQ(first->StringValue() + again->StringValue(), "11");
+    rows->Close();
+    EXPECT_EQ(std::string(*document), firstDocument);
+    db.Close();
+}
+
 TEST_F(StoreTest, NumbersAndBlobsReadAsText) {
     Write({}, "create table results_store (id integer primary key, datetime real, results blob)");
     Exec("insert into results_store values (12, 2.5, x'436f6465')");

@@ -4,6 +4,7 @@
 #include <gtest/gtest.h>
 
 #include <limits>
+#include <random>
 
 namespace {
 
@@ -48,6 +49,33 @@ TEST(Text, InStrCountsCharactersFromOne) {
     EXPECT_EQ(InStr(0, "abc", ""), 0);
     EXPECT_EQ(InStr(2, "abcabc", "abc"), 4);
     EXPECT_EQ(InStr(0, "\xC3\xA9\xC3\xA9x", "x"), 3) << "two characters of two bytes each";
+}
+
+// Against a plain scan on random texts: a search that takes several bytes at a time must not
+// miss or invent a match anywhere, at the start of a block of bytes or in the last few bytes.
+TEST(Text, InStrAgreesWithAPlainScanOnRandomTexts) {
+    std::mt19937 random(7);
+    const std::string alphabet = "cCoOdDeE @`[{\r";  // with the bytes 0x20 away from letters
+    const auto text = [&](size_t longest) {
+        std::string out(random() % (longest + 1), ' ');
+        for (char& c : out) {
+            c = alphabet[random() % alphabet.size()];
+        }
+        return out;
+    };
+    const auto fold = [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + 32) : c; };
+    for (int i = 0; i < 20000; ++i) {
+        const std::string source = text(40);
+        const std::string find = text(3) + alphabet[random() % alphabet.size()];
+        long long expected = 0;
+        for (size_t at = 0; expected == 0 && at + find.size() <= source.size(); ++at) {
+            if (std::equal(find.begin(), find.end(), source.begin() + static_cast<long>(at),
+                           [&](char a, char b) { return fold(a) == fold(b); })) {
+                expected = static_cast<long long>(at) + 1;
+            }
+        }
+        ASSERT_EQ(InStr(0, source, find), expected) << "'" << source << "' '" << find << "'";
+    }
 }
 
 TEST(Text, LeftTakesCharacters) {
