@@ -1,5 +1,5 @@
-// The window's background follows the appearance: at opening and at every change; a change
-// with no window open makes a new one.
+// The window's background and the list's stripes follow the appearance: at opening and at every
+// change; a change with no window open makes a new one.
 #include "platform/appearance.h"
 #include "platform/notifications.h"
 #include "window_fixture.h"
@@ -26,20 +26,27 @@ TEST_F(AppearanceTest, OpenedInTheDarkTheWindowTakesTheDesktopColour) {
     EXPECT_NE(window->BackColor(), 0xFFFFFFu);
 }
 
-// Opened in the light (the fixture's default) the window is white; each change repaints it.
-TEST_F(AppearanceTest, EachChangeSetsTheBackgroundAgain) {
+// Opened in the light (the fixture's default) the window is white; each change recolours it
+// and the list's stripes, and the selected row still shows.
+TEST_F(AppearanceTest, EachChangeRecoloursTheWindowAndTheStripes) {
+    Store({{"1", "", "", "A", ""}, {"2", "", "", "A", ""}, {"3", "", "", "A", ""}});
     auto window = StartUp();
     EXPECT_EQ(window->BackColor(), 0xFFFFFFu);
+    EXPECT_EQ(Stripe(window, 0), qRgb(237, 243, 254));
+    EXPECT_EQ(Stripe(window, 1), qRgb(255, 255, 255));
+
     SetAppearanceForTesting(Appearance::Dark);
-    ProcessEvents();
-    const QImage shot = window->Client()->grab().toImage();
-    const Color fill = FillColor();
-    EXPECT_EQ(shot.pixel(5, 600), qRgb(Red(fill), Green(fill), Blue(fill)));
+    EXPECT_EQ(Pixel(window->Client(), 5, 600), Rgb(FillColor()));
+    EXPECT_EQ(Stripe(window, 0), qRgb(22, 22, 22));
+    EXPECT_EQ(Stripe(window, 1), Rgb(FillColor()));
+    EXPECT_EQ(Stripe(window, 2), qRgb(22, 22, 22));
+    window->Listbox1()->SetListIndex(2);
+    EXPECT_NE(Stripe(window, 2), qRgb(22, 22, 22)) << "the selected row is marked";
 
     SetAppearanceForTesting(Appearance::Light);
     ProcessEvents();
     EXPECT_EQ(window->BackColor(), 0xFFFFFFu);
-    EXPECT_EQ(window->Client()->grab().toImage().pixel(5, 600), qRgb(255, 255, 255));
+    EXPECT_EQ(Pixel(window->Client(), 5, 600), qRgb(255, 255, 255));
 }
 
 TEST_F(AppearanceTest, NotificationsAreQueuedAndDeliveredOnceEachFromTheEventLoop) {

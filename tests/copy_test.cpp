@@ -20,13 +20,6 @@ class CopyTest : public ::testing::Test {
     fs::path dst = tree.Path() / "dst";
 };
 
-TEST_F(CopyTest, NilArgumentsRaise) {
-    WriteFile(src / "P.plugin/x", "x");
-    EXPECT_THROW(CopyFileOrFolder(nullptr, Item(dst)), NilObjectException);
-    EXPECT_THROW(CopyFileOrFolder(Item(src / "P.plugin"), nullptr), NilObjectException);
-    EXPECT_FALSE(fs::exists(dst));
-}
-
 // The same folder twice, but side by side and not on one path, is no loop.
 TEST_F(CopyTest, TheSameFolderLinkedTwiceSideBySideIsNoLoop) {
     WriteFile(tree.Path() / "shared/s.txt", "s");

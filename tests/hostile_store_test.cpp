@@ -4,8 +4,6 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include <sqlite3.h>
-
 #include <chrono>
 #include <future>
 
@@ -64,6 +62,8 @@ void MakeCorrupt(const fs::path& store) {
 INSTANTIATE_TEST_SUITE_P(
     Stores, HostileStoreTest,
     ::testing::Values(
+        HostileStore{"NoFile", [](const fs::path&) {}, {}},
+        HostileStore{"EmptyTable", [](const fs::path& p) { demo::WriteStore(p, {}); }, {}},
         HostileStore{"Folder", [](const fs::path& p) { fs::create_directory(p); }, {}},
         HostileStore{"ZeroBytes", [](const fs::path& p) { WriteFile(p, ""); }, {}},
         HostileStore{"Corrupt", MakeCorrupt, {}},

@@ -1,11 +1,7 @@
 // The list page on the real window: loads on every arrival, never clears on a failed read,
-// stripes by appearance, sorts by heading.
+// sorts by heading.
 #include <QHeaderView>
-#include <QImage>
 
-#include <sqlite3.h>
-
-#include "platform/appearance.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -74,16 +70,9 @@ TEST_F(ListPageTest, EveryArrivalOnTheListReloadsRowsStoredMeanwhile) {
 TEST_F(ListPageTest, ATableWithoutIdStopsTheLoadAtTheFirstRowInSilence) {
     Store({},
           "create table results_store (datetime text, document text, grade text, results text)");
-    {
-        // The schema lacks id: write the two rows by hand.
-        sqlite3* db = nullptr;
-        sqlite3_open(demo::StorePath(tree.Path()).c_str(), &db);
-        sqlite3_exec(db,
-                     "insert into results_store values ('2018', 'Box.ai', 'B', 'Code reads 7');"
-                     "insert into results_store values ('2019', 'Jar.ai', 'C', 'Code reads 8')",
-                     nullptr, nullptr, nullptr);
-        sqlite3_close(db);
-    }
+    ExecSql(demo::StorePath(tree.Path()),  // the schema lacks id: the rows are written by hand
+            "insert into results_store values ('2018', 'Box.ai', 'B', 'Code reads 7');"
+            "insert into results_store values ('2019', 'Jar.ai', 'C', 'Code reads 8')");
     ::testing::internal::CaptureStderr();
     auto window = StartUp();
     EXPECT_EQ(::testing::internal::GetCapturedStderr().find("Exception"), std::string::npos)
@@ -114,36 +103,6 @@ TEST_F(ListPageTest, AClickOnAHeadingSortsAndTheOrderHoldsAcrossReloads) {
     ProcessEvents();
     EXPECT_EQ(Column(window, 1), (std::vector<std::string>{"d.ai", "C.ai", "b.ai", "a.ai"}));
     EXPECT_EQ(VariantToString(window->Listbox1()->RowTag(0)), "4");
-}
-
-class StripeTest : public WindowTest {
-  protected:
-    QImage ListImage(const Ref<class Window1>& window) {
-        ProcessEvents();
-        return View(window).viewport()->grab().toImage();
-    }
-    QRgb RowPixel(const QImage& image, int row) { return image.pixel(120, row * 25 + 12); }
-};
-
-TEST_F(StripeTest, RowsAreStripedByAppearanceAndTheSelectionStillShows) {
-    Store({Result("1", ""), Result("2", ""), Result("3", "")});
-    auto window = StartUp();
-    QImage image = ListImage(window);
-    EXPECT_EQ(RowPixel(image, 0), qRgb(237, 243, 254));
-    EXPECT_EQ(RowPixel(image, 1), qRgb(255, 255, 255));
-
-    SetAppearanceForTesting(Appearance::Dark);
-    const Color fill = FillColor();
-    image = ListImage(window);
-    EXPECT_EQ(RowPixel(image, 0), qRgb(22, 22, 22));
-    EXPECT_EQ(RowPixel(image, 1), qRgb(Red(fill), Green(fill), Blue(fill)));
-    EXPECT_EQ(RowPixel(image, 2), qRgb(22, 22, 22));
-
-    window->Listbox1()->SetListIndex(2);
-    image = ListImage(window);
-    EXPECT_NE(RowPixel(image, 2), qRgb(22, 22, 22)) << "the selected row is marked";
-    SetAppearanceForTesting(Appearance::Light);
-    ProcessEvents();
 }
 
 }  // namespace

@@ -113,18 +113,7 @@ class PortalTest : public WindowTest {
     bool WaitForBackColor(const Ref<class Window1>& window, bool dark) {
         return QTest::qWaitFor([&] { return (window->BackColor() != 0xFFFFFF) == dark; }, 5000);
     }
-    QRgb Pixel(QWidget* widget, int x, int y) {
-        ProcessEvents();
-        return widget->grab().toImage().pixel(x, y);
-    }
-    QRgb Stripe(const Ref<class Window1>& window, int row) {
-        return Pixel(View(window).viewport(), 120, row * 25 + 12);
-    }
 };
-
-QRgb Rgb(Color color) {
-    return qRgb(Red(color), Green(color), Blue(color));
-}
 
 TEST_F(PortalTest, SwitchingRecoloursTheWindowAndTheStripes) {
     PrivateSessionBus::settings->scheme = kLight;

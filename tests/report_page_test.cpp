@@ -1,6 +1,4 @@
 // The report page on the real window: a double click reads the row again and fills the form.
-#include <sqlite3.h>
-
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -91,11 +89,8 @@ TEST_F(ReportPageTest, AMissingColumnRaisesOutOfTheHandlerAndThePageStays) {
     auto window = StartUp();
     // The same row in a table without the document column.
     Store({}, "create table results_store (id text, results text)");
-    sqlite3* db = nullptr;
-    sqlite3_open(demo::StorePath(tree.Path()).c_str(), &db);
-    const std::string insert = "insert into results_store values ('a', '" + kReport + "')";
-    ASSERT_EQ(sqlite3_exec(db, insert.c_str(), nullptr, nullptr, nullptr), SQLITE_OK);
-    sqlite3_close(db);
+    ExecSql(demo::StorePath(tree.Path()),
+            "insert into results_store values ('a', '" + kReport + "')");
 
     ::testing::internal::CaptureStderr();
     DoubleClickRow(window, 0);

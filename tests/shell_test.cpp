@@ -36,48 +36,27 @@ using ShellTest = WindowTest;
 
 }  // namespace
 
-TEST_F(ShellTest, MainLandsInListingWithAnEmptyList) {
-    // The real _Main, with its event loop ended as soon as the window shows the list.
-    QTimer poll;
-    QObject::connect(&poll, &QTimer::timeout, [] {
-        auto window = _GetImplicitWindow("Window1.Window1");
-        if (window && Cast<class Window1>(window)->PagePanel1()->Value() == 1) {
-            QCoreApplication::exit(0);  // quit() would close the window too
-        }
-    });
-    poll.start(10);
-    QTimer::singleShot(5000, [] { QCoreApplication::exit(1); });
-    _Main();
-
-    auto window = Window1();
-    EXPECT_EQ(StateOf(window), State::Listing);
-    EXPECT_EQ(window->Listbox1()->ListCount(), 0);
-    EXPECT_EQ(window->Title(), "Orbelane Verification Storage");
-    EXPECT_TRUE(window->Native()->isVisible());
-}
-
-// The window is built on the installation page, but the user's first sight is the list.
-TEST_F(ShellTest, MainPaintsTheListPageFirstAndNeverTheInstallationPage) {
+// The real _Main, ended as soon as the list is painted. The window is built on the installation
+// page, but the user's first sight is the list.
+TEST_F(ShellTest, MainPaintsTheEmptyListFirstAndNeverTheInstallationPage) {
     struct PaintCount : QObject {
         int installPage = 0;
         int listPage = 0;
         bool eventFilter(QObject* watched, QEvent* event) override {
             auto window = Cast<class Window1>(_GetImplicitWindow("Window1.Window1"));
             if (event->type() == QEvent::Paint && window) {
+                auto* list = static_cast<QTableView*>(window->Listbox1()->Widget());
                 installPage += watched == window->PushButton1()->Widget() ? 1 : 0;
-                listPage += watched == View(window).viewport() ? 1 : 0;
+                listPage += watched == list->viewport() ? 1 : 0;
             }
             return false;
-        }
-        QTableView& View(const Ref<class Window1>& window) {
-            return *static_cast<QTableView*>(window->Listbox1()->Widget());
         }
     } count;
     QApplication::instance()->installEventFilter(&count);
     QTimer poll;
     QObject::connect(&poll, &QTimer::timeout, [&count] {
         if (count.listPage > 0) {
-            QCoreApplication::exit(0);
+            QCoreApplication::exit(0);  // quit() would close the window too
         }
     });
     poll.start(10);
@@ -85,9 +64,13 @@ TEST_F(ShellTest, MainPaintsTheListPageFirstAndNeverTheInstallationPage) {
     _Main();
     QApplication::instance()->removeEventFilter(&count);
 
+    auto window = Window1();
     EXPECT_GT(count.listPage, 0);
     EXPECT_EQ(count.installPage, 0);
-    EXPECT_EQ(StateOf(Window1()), State::Listing);
+    EXPECT_EQ(StateOf(window), State::Listing);
+    EXPECT_EQ(window->Listbox1()->ListCount(), 0);
+    EXPECT_EQ(window->Title(), "Orbelane Verification Storage");
+    EXPECT_TRUE(window->Native()->isVisible());
 }
 
 TEST_F(ShellTest, EitherOrderOfOpenAndLateStartupGivesOneWindowOnTheList) {
@@ -138,16 +121,10 @@ TEST_P(TransitionTest, FollowsTheStateTable) {
         window->PagePanel1()->SetValue(2);  // where a double click that loads leads
     }
     ASSERT_EQ(StateOf(window), t.from);
-    switch (t.action) {
-        case Transition::Segment0:
-            window->MainTabs()->Press(0);
-            break;
-        case Transition::Segment1:
-            window->MainTabs()->Press(1);
-            break;
-        case Transition::Close:
-            window->PushButton2()->Push();
-            break;
+    if (t.action == Transition::Close) {
+        window->PushButton2()->Push();
+    } else {
+        window->MainTabs()->Press(t.action);  // the segment's index
     }
     EXPECT_EQ(StateOf(window), t.to);
 }

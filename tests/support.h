@@ -1,5 +1,5 @@
-// Test support: temporary trees, the file-system root, message capture, and a clean slate of
-// windows and application object for each test.
+// Test support: temporary trees, the file-system root, message capture, SQL on a store, and a
+// clean slate of windows and application object for each test.
 #pragma once
 
 #include <QApplication>
@@ -8,10 +8,12 @@
 #include <QTimer>
 
 #include <gtest/gtest.h>
+#include <sqlite3.h>
 
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -47,21 +49,13 @@ class ScopedRoot {
     explicit ScopedRoot(const std::filesystem::path& root) {
         if (const char* old = std::getenv("ORBELANE_ROOT")) {
             old_ = old;
-            hadOld_ = true;
         }
         setenv("ORBELANE_ROOT", root.c_str(), 1);
     }
-    ~ScopedRoot() {
-        if (hadOld_) {
-            setenv("ORBELANE_ROOT", old_.c_str(), 1);
-        } else {
-            unsetenv("ORBELANE_ROOT");
-        }
-    }
+    ~ScopedRoot() { old_ ? setenv("ORBELANE_ROOT", old_->c_str(), 1) : unsetenv("ORBELANE_ROOT"); }
 
   private:
-    std::string old_;
-    bool hadOld_ = false;
+    std::optional<std::string> old_;
 };
 
 // Reads every message that MsgBox would show.
@@ -82,6 +76,14 @@ inline void WriteFile(const std::filesystem::path& path, const std::string& byte
 inline std::string ReadFile(const std::filesystem::path& path) {
     std::ifstream in(path, std::ios::binary);
     return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+}
+
+// Runs SQL on a store as the plug-in would, with its own connection.
+inline void ExecSql(const std::filesystem::path& store, const std::string& sql) {
+    sqlite3* db = nullptr;
+    sqlite3_open(store.c_str(), &db);
+    EXPECT_EQ(sqlite3_exec(db, sql.c_str(), nullptr, nullptr, nullptr), SQLITE_OK) << sql;
+    sqlite3_close(db);
 }
 
 // Lets queued timers and posted events run.

@@ -29,10 +29,8 @@ INSTANTIATE_TEST_SUITE_P(
     Fields, NthFieldTest,
     ::testing::Values(
         FieldCase{"PastTheLastField", "a", "x", 2, "", 1},
-        FieldCase{"EighthLineOfThree", "one\rtwo\rthree", "\r", 8, "", 3},
         FieldCase{"LongSeparatorAsAWhole", "Code reads 123", "Code reads", 2, " 123", 2},
         FieldCase{"PartOfTheSeparatorDoesNotSplit", "Code 123", "Code reads", 1, "Code 123", 1},
-        FieldCase{"CaseIsIgnored", "xCODE READSy", "Code reads", 2, "y", 2},
         FieldCase{"AdjacentSeparatorsEncloseAnEmptyField", "a,,b", ",", 2, "", 3},
         FieldCase{"TrailingBlankMakesAnEmptyLastField", "Adobe Illustrator ", " ", 3, "", 3},
         FieldCase{"FieldZero", "a,b", ",", 0, "", 2},
@@ -98,10 +96,7 @@ TEST(Text, ValReadsTheLeadingNumber) {
     EXPECT_EQ(Val("1e3"), 1000.0);
     EXPECT_EQ(Val("1e"), 1.0);
     EXPECT_EQ(Val("inf") + Val("nan") + Val("."), 0.0) << "no words, only digits";
-}
-
-// Beyond the range of a double the value is what a double makes of the text.
-TEST(Text, ValBeyondTheRangeOfADouble) {
+    // Beyond the range of a double the value is what a double makes of the text.
     const double infinity = std::numeric_limits<double>::infinity();
     EXPECT_EQ(Val("1e999"), infinity);
     EXPECT_EQ(Val("-1e999"), -infinity);

@@ -1,6 +1,7 @@
 // A window started as at program start, over a temporary tree with a results store.
 #pragma once
 
+#include <QImage>
 #include <QTableView>
 #include <QTest>
 
@@ -37,6 +38,15 @@ class WindowTest : public SlateTest {
         QTest::mouseClick(view.viewport(), Qt::LeftButton, {}, rect.center());
         QTest::mouseDClick(view.viewport(), Qt::LeftButton, {}, rect.center());
     }
+    // A pixel of the widget as painted now; Stripe gives one inside a row of the list.
+    QRgb Pixel(QWidget* widget, int x, int y) {
+        ProcessEvents();
+        return widget->grab().toImage().pixel(x, y);
+    }
+    QRgb Stripe(const Ref<class Window1>& window, int row) {
+        return Pixel(View(window).viewport(), 120, row * 25 + 12);
+    }
+    static QRgb Rgb(Color color) { return qRgb(Red(color), Green(color), Blue(color)); }
     std::vector<std::string> Column(const Ref<class Window1>& window, int column) {
         std::vector<std::string> cells;
         auto list = window->Listbox1();

@@ -41,18 +41,14 @@ class YieldTest : public WindowTest {
         window->MainTabs()->Press(1);
     }
 
-    // Every row's four cells and tag, then the selection, the page and the sort.
+    // Every column of cells, the tags, then the selection, the page and the sort.
     std::vector<std::vector<std::string>> State(const Ref<class Window1>& window) {
         ProcessEvents();
-        std::vector<std::vector<std::string>> state;
         auto list = window->Listbox1();
+        std::vector<std::vector<std::string>> state{
+            Column(window, 0), Column(window, 1), Column(window, 2), Column(window, 3), {}};
         for (long long row = 0; row < list->ListCount(); ++row) {
-            std::vector<std::string> cells;
-            for (int column = 0; column < 4; ++column) {
-                cells.push_back(list->Cell(row, column));
-            }
-            cells.push_back(VariantToString(list->RowTag(row)));
-            state.push_back(cells);
+            state.back().push_back(VariantToString(list->RowTag(row)));
         }
         state.push_back({std::to_string(list->ListIndex()),
                          std::to_string(window->PagePanel1()->Value()),
@@ -95,7 +91,7 @@ TEST_P(SameListTest, APaintingLoadLeavesTheSameListAsAnEmptyYield) {
     }
     Reload(window);
     const auto empty = State(window);
-    ASSERT_EQ(empty.size(), static_cast<size_t>(kRows + 1));
+    ASSERT_EQ(empty[4].size(), static_cast<size_t>(kRows));
 
     int paints = 0;
     SetYieldIntervalForTesting(std::chrono::nanoseconds(0));
