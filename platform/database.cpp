@@ -98,12 +98,12 @@ Ref<DatabaseField> RecordSet::Field(std::string_view name) const {
     }
     int column = -1;
     // A loop asks the same names in the same order: the one behind the last is tried first.
-    if (nextAsked_ < asked_.size() && SameBytes(asked_[nextAsked_].first, name)) {
+    if (nextAsked_ < asked_.size() && asked_[nextAsked_].first == name) {
         column = asked_[nextAsked_].second;
     } else {
         nextAsked_ = 0;
         for (; nextAsked_ < asked_.size(); ++nextAsked_) {
-            if (SameBytes(asked_[nextAsked_].first, name)) {
+            if (asked_[nextAsked_].first == name) {
                 column = asked_[nextAsked_].second;
                 break;
             }

@@ -20,19 +20,6 @@ std::string Chr(long long code);
 // 0 when the two texts are equal, case aside; otherwise the sign of their order.
 int RuntimeStringCompare(std::string_view first, std::string_view second);
 bool TextEquals(std::string_view first, std::string_view second);
-// Byte for byte, inline and without a call to memcmp: for short names that a loop asks for
-// again and again.
-inline bool SameBytes(std::string_view first, std::string_view second) {
-    if (first.size() != second.size()) {
-        return false;
-    }
-    for (size_t i = 0; i < first.size(); ++i) {
-        if (first[i] != second[i]) {
-            return false;
-        }
-    }
-    return true;
-}
 
 // The run-time's conversion of a double to a 64-bit integer: towards zero, saturating at the
 // ends of the range, and 0 for a NaN.

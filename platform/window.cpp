@@ -16,7 +16,6 @@
 #include "platform/menu.h"
 #include "platform/native_window.h"
 #include "platform/qt_color.h"
-#include "platform/text.h"
 
 namespace {
 std::vector<std::shared_ptr<Window>> openWindows;
@@ -139,11 +138,11 @@ void Window::_AddControl(const Ref<Control>& control, const std::string& name) {
 const Ref<Control>& Window::_ControlByName(std::string_view name) const {
     static const Ref<Control> kNone;
     RequireMainThread();
-    if (lastFound_ < controls_.size() && SameBytes(controls_[lastFound_]->Name(), name)) {
+    if (lastFound_ < controls_.size() && controls_[lastFound_]->Name() == name) {
         return controls_[lastFound_];
     }
     for (size_t i = 0; i < controls_.size(); ++i) {
-        if (SameBytes(controls_[i]->Name(), name)) {
+        if (controls_[i]->Name() == name) {
             lastFound_ = i;
             return controls_[i];
         }
