@@ -33,7 +33,6 @@ std::chrono::nanoseconds CoarseNow() {
 #endif
 }
 
-YieldClock readClock = &CoarseNow;
 std::chrono::nanoseconds interval = kPaintInterval;
 std::chrono::nanoseconds lastPaint{0};
 std::function<void(std::chrono::nanoseconds)> paintObserver;
@@ -79,7 +78,7 @@ void RuntimeBackgroundTask() {
     if (interval == std::chrono::nanoseconds::max()) {
         return;
     }
-    const std::chrono::nanoseconds now = readClock();
+    const std::chrono::nanoseconds now = CoarseNow();
     if (painting || now - lastPaint < interval) {
         return;
     }
@@ -89,11 +88,6 @@ void RuntimeBackgroundTask() {
 
 bool YieldIsPainting() {
     return painting;
-}
-
-void SetYieldClockForTesting(YieldClock testClock) {
-    readClock = testClock ? testClock : &CoarseNow;
-    lastPaint = std::chrono::nanoseconds{0};
 }
 
 void SetYieldIntervalForTesting(std::chrono::nanoseconds testInterval) {

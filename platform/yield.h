@@ -9,9 +9,6 @@
 // leaves it for later then: the handler that gave way is still running.
 bool YieldIsPainting();
 
-// The clock that the throttle reads; nullptr for the real one.
-using YieldClock = std::chrono::nanoseconds (*)();
-void SetYieldClockForTesting(YieldClock clock);
 // The least time between two painting yields: 50 ms unless set. Zero paints at every yield;
 // nanoseconds::max() makes the yield an empty one that does not even read the clock.
 void SetYieldIntervalForTesting(std::chrono::nanoseconds interval);
