@@ -35,6 +35,8 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     // What a screen reader calls the control, where the widget has no text of its own to offer.
     void SetAccessibleName(const std::string& name);
 
+    // The control that this one stands in, by its initial parent; Nil for the window itself.
+    Ref<Control> Parent() const;
     // Whether the control can be seen: visible itself, on the page its container shows.
     bool IsShown() const;
     // Containers whose pages hide and show the controls that lie on them.
@@ -79,6 +81,5 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     std::unique_ptr<QObject> context_;
 
     friend class Window;
-    Ref<Control> Parent() const;
     void SetWidgetFont();
 };

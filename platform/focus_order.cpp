@@ -13,16 +13,8 @@ namespace {
 
 std::vector<long long> TabPath(const Control& control) {
     std::vector<long long> path{control.IntegerProperty("TabIndex")};
-    const auto window = control.Window();
-    std::string parent = control.StringProperty("InitialParent");
-    // The bound stops a table whose parents go round in a circle.
-    for (size_t depth = 0; window && !parent.empty() && depth < 64; ++depth) {
-        Ref<Control> above = window->_ControlByName(parent);
-        if (!above) {
-            break;
-        }
+    for (auto above = control.Parent(); above; above = above->Parent()) {
         path.push_back(above->IntegerProperty("TabIndex"));
-        parent = above->StringProperty("InitialParent");
     }
     std::reverse(path.begin(), path.end());
     return path;
