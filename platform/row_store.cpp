@@ -10,14 +10,6 @@
 
 namespace {
 
-void PutLength(std::string& out, size_t length) {
-    while (length >= 0x80) {
-        out += static_cast<char>((length & 0x7F) | 0x80);
-        length >>= 7;
-    }
-    out += static_cast<char>(length);
-}
-
 char* PutLength(char* out, size_t length) {
     while (length >= 0x80) {
         *out++ = static_cast<char>((length & 0x7F) | 0x80);
@@ -25,6 +17,11 @@ char* PutLength(char* out, size_t length) {
     }
     *out++ = static_cast<char>(length);
     return out;
+}
+
+void PutLength(std::string& out, size_t length) {
+    char bytes[10];  // a 64-bit length takes at most ten
+    out.append(bytes, PutLength(bytes, length));
 }
 
 size_t LengthSize(size_t length) {
