@@ -9,10 +9,17 @@
 
 namespace {
 
-std::unordered_map<std::string, PropertyType>& PropertyTypes() {
+// Looked up by a view of the name, without building a string for it.
+struct NameHash {
+    using is_transparent = void;
+    size_t operator()(std::string_view name) const { return std::hash<std::string_view>{}(name); }
+};
+using TypeMap = std::unordered_map<std::string, PropertyType, NameHash, std::equal_to<>>;
+
+TypeMap& PropertyTypes() {
     using T = PropertyType;
-    static std::unordered_map<std::string, PropertyType> types = [] {
-        std::unordered_map<std::string, PropertyType> map;
+    static TypeMap types = [] {
+        TypeMap map;
         for (auto name : {"Visible",
                           "Enabled",
                           "AutoDeactivate",
@@ -139,7 +146,7 @@ T ReadRaw(std::string_view block, size_t& at) {
 
 PropertyType TypeOfProperty(std::string_view name) {
     const auto& types = PropertyTypes();
-    const auto found = types.find(std::string(name));
+    const auto found = types.find(name);
     return found == types.end() ? PropertyType::Nothing : found->second;
 }
 
