@@ -7,6 +7,7 @@
 #include "platform/text.h"
 
 namespace {
+const std::string kLineEnd = Chr(13);
 const std::string kCodeReads = "Code reads";
 const std::string kCodeIs = "Code is";
 const std::string kMeasurements = "Actual Measurements = +- mic 0";
@@ -14,16 +15,14 @@ const std::string kDeviances = "Bar/Space Deviances = +- mic 0";
 
 // The readers look at views into the text and copy only the value they return: the list
 // reads a value from every row of the store. Line n counts from 1; past the last line it is
-// the empty text. A line end has no case, so it is found as a plain byte.
+// the empty text.
 std::string_view LineView(std::string_view text, long long n) {
-    for (; n > 1; --n) {
-        const size_t end = text.find('\r');
-        if (end == std::string_view::npos) {
-            return {};
-        }
-        text.remove_prefix(end + 1);
-    }
-    return text.substr(0, text.find('\r'));
+    return NthFieldView(text, kLineEnd, n);
+}
+
+// Whether `line` holds `marker`, case aside.
+bool Has(std::string_view line, std::string_view marker) {
+    return NthFieldView(line, marker, 1).size() != line.size();
 }
 
 // The text behind the first `marker` on `line`, case aside, up to its next occurrence; none
@@ -67,7 +66,7 @@ std::string ReportCodeType(const std::string& text) {
 
 bool PassesReportTest(const std::string& text) {
     const std::string_view first = LineView(text, 1);
-    return Behind(first, kCodeReads) || Behind(first, kCodeIs);
+    return Has(first, kCodeReads) || Has(first, kCodeIs);
 }
 
 std::string SymbolLength(const std::string& text) {
