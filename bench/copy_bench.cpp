@@ -4,8 +4,6 @@
 //   bench_copy [RUNS]
 #include <QApplication>
 
-#include <algorithm>
-#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>

@@ -7,11 +7,9 @@
 //   bench_huge_text [RUNS] [FOLDER]   (stores are made in FOLDER once and kept)
 //   bench_huge_text --one ROOT        (one measured process; used by the above)
 #include <QApplication>
-#include <QElapsedTimer>
 #include <QTableView>
 
 #include <cstdio>
-#include <fstream>
 #include <string>
 #include <vector>
 
@@ -29,14 +27,7 @@ constexpr size_t kRows = 1000;
 constexpr size_t kHugeRow = 500;
 
 double ResidentMegabytes() {
-    std::ifstream status("/proc/self/status");
-    std::string line;
-    while (std::getline(status, line)) {
-        if (line.rfind("VmRSS:", 0) == 0) {
-            return std::atof(line.c_str() + 6) / 1024.0;
-        }
-    }
-    return 0;
+    return StatusKilobytes("VmRSS") / 1024.0;
 }
 
 // Prints "load repaint open before shown closed reloaded" (ms, ms, ms, MB, MB, MB, MB).

@@ -19,7 +19,6 @@
 
 #include <sqlite3.h>
 
-#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 #include <fstream>
@@ -37,17 +36,6 @@
 namespace fs = std::filesystem;
 
 namespace {
-
-long StatusKilobytes(const char* key) {
-    std::ifstream status("/proc/self/status");
-    std::string line;
-    while (std::getline(status, line)) {
-        if (line.rfind(key, 0) == 0) {
-            return std::atol(line.c_str() + std::string(key).size() + 1);
-        }
-    }
-    return 0;
-}
 
 constexpr int kCopyFiles = 2000;
 

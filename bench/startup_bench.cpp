@@ -3,8 +3,6 @@
 #include <spawn.h>
 #include <sys/wait.h>
 
-#include <algorithm>
-#include <chrono>
 #include <cstdio>
 #include <string>
 #include <vector>
@@ -16,20 +14,19 @@ extern char** environ;
 namespace {
 
 double RunMilliseconds(const std::string& program, const char* argument = nullptr) {
-    const auto start = std::chrono::steady_clock::now();
-    pid_t pid = 0;
-    char* argv[] = {const_cast<char*>(program.c_str()), const_cast<char*>(argument), nullptr};
-    if (posix_spawn(&pid, program.c_str(), nullptr, nullptr, argv, environ) != 0) {
-        std::perror("posix_spawn");
-        return -1;
-    }
-    int status = 0;
-    waitpid(pid, &status, 0);
-    const auto end = std::chrono::steady_clock::now();
-    if (!WIFEXITED(status) || WEXITSTATUS(status) != 0) {
-        std::fprintf(stderr, "%s did not show its window\n", program.c_str());
-    }
-    return std::chrono::duration<double, std::milli>(end - start).count();
+    return Milliseconds([&] {
+        pid_t pid = 0;
+        char* argv[] = {const_cast<char*>(program.c_str()), const_cast<char*>(argument), nullptr};
+        if (posix_spawn(&pid, program.c_str(), nullptr, nullptr, argv, environ) != 0) {
+            std::perror("posix_spawn");
+            return;
+        }
+        int status = 0;
+        waitpid(pid, &status, 0);
+        if (!WIFEXITED(status) || WEXITSTATUS(status) != 0) {
+            std::fprintf(stderr, "%s did not show its window\n", program.c_str());
+        }
+    });
 }
 
 }  // namespace

@@ -1,10 +1,11 @@
-// The clock and the median that every benchmark reports with.
+// The clock, the median and the memory figures that every benchmark reports with.
 #pragma once
 
 #include <algorithm>
 #include <chrono>
 #include <cstdio>
 #include <cstdlib>
+#include <fstream>
 #include <string>
 #include <vector>
 
@@ -28,4 +29,16 @@ inline double TimeCommand(const std::string& command) {
             std::fprintf(stderr, "failed: %s\n", command.c_str());
         }
     });
+}
+
+// A line of /proc/self/status, such as "VmRSS" or "VmHWM", in kilobytes; 0 if it is missing.
+inline long StatusKilobytes(const std::string& key) {
+    std::ifstream status("/proc/self/status");
+    std::string line;
+    while (std::getline(status, line)) {
+        if (line.rfind(key + ":", 0) == 0) {
+            return std::atol(line.c_str() + key.size() + 1);
+        }
+    }
+    return 0;
 }
