@@ -1,14 +1,18 @@
 #!/usr/bin/env bash
-# Installs a built tree into a temporary prefix and checks what stands there: the program, both
-# plug-in items where the program looks for them, the desktop entry and the icon. Then makes the
-# Debian package and checks that it holds the program and depends on the libraries it links.
+# Makes the Debian package of a built tree, unpacks it into a temporary folder and checks what
+# stands there: the program, both plug-in items where the program looks for them, the desktop
+# entry and the icon, nothing else, and the libraries that the package depends on.
 # Usage: scripts/check-install.sh [BUILD_DIR]
 set -euo pipefail
 cd "$(dirname "$0")/.."
-build=${1:-build}
-prefix=$(mktemp -d -t orbelane-install.XXXXXX)
-trap 'rm -rf "$prefix"' EXIT
-cmake --install "$build" --prefix "$prefix" > /dev/null
+build=$(cd "${1:-build}" && pwd)
+work=$(mktemp -d -t orbelane-install.XXXXXX)
+trap 'rm -rf "$work"' EXIT
+(cd "$work" && cpack -G DEB -B "$work/package" --config "$build/CPackConfig.cmake" > cpack.log 2>&1) ||
+  { cat "$work/cpack.log"; exit 1; }
+deb=$(ls "$work"/package/*.deb)
+dpkg-deb -x "$deb" "$work/root"
+prefix=$work/root/usr
 
 name=orbelane-verification-storage
 failed=0
@@ -28,24 +32,19 @@ expect -f "share/icons/hicolor/scalable/apps/$name.svg"
 if [ -f "$prefix/share/applications/$name.desktop" ]; then
   desktop-file-validate "$prefix/share/applications/$name.desktop" || failed=1
 fi
-# Nothing else is installed: no test, benchmark or demo program, no static library.
+# Nothing else is in the package: no test, benchmark or demo program, no static library.
 unexpected=$(cd "$prefix" && find . -type f | grep -v -e "^./bin/$name\$" -e "^./share/$name/" \
   -e "^./share/applications/$name.desktop\$" -e "^./share/icons/hicolor/scalable/apps/$name.svg\$" \
   || true)
+[ "$(ls -A "$work/root")" = usr ] || unexpected="$unexpected $(ls -A "$work/root")"
 if [ -n "$unexpected" ]; then
   echo "Unexpected files installed:"
   echo "$unexpected"
   failed=1
 fi
 
-build=$(cd "$build" && pwd)
-(cd "$prefix" && cpack -G DEB -B "$prefix/package" --config "$build/CPackConfig.cmake" > cpack.log 2>&1) ||
-  { cat "$prefix/cpack.log"; exit 1; }
-deb=$(ls "$prefix"/package/*.deb)
 depends=$(dpkg-deb -f "$deb" Depends)
 echo "package $(basename "$deb"): Depends: $depends"
-dpkg-deb -c "$deb" > "$prefix/contents"
-grep -q " ./usr/bin/$name\$" "$prefix/contents" || { echo "MISSING usr/bin/$name in the package"; failed=1; }
 for library in libqt6widgets6 libsqlite3-0; do
   [[ $depends == *"$library "* ]] || { echo "MISSING dependency $library"; failed=1; }
 done
