@@ -2,6 +2,7 @@
 #include "platform/list_model.h"
 
 #include <QSize>
+#include <QTableView>
 #include <QTimer>
 
 #include "platform/shown_text.h"

@@ -4,9 +4,10 @@
 
 #include <QAbstractTableModel>
 #include <QStringList>
-#include <QTableView>
 
 #include "platform/row_store.h"
+
+class QTableView;
 
 class ListModel : public QAbstractTableModel {
   public:
