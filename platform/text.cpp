@@ -94,14 +94,22 @@ char32_t Fold(char32_t code) {
 }
 
 // The first place from `at` to `last` whose byte is `lower`, or for a letter its capital too;
-// npos when there is none. Eight bytes are tested at once (the lowest byte of a word comes
-// first in memory), with no call per candidate: most texts searched are short lines.
+// npos when there is none. For a letter, eight bytes are tested at once (the lowest byte of a
+// word comes first in memory), with no call per candidate: most texts searched are short lines.
 size_t NextCandidate(std::string_view source, size_t at, size_t last, char lower) {
     static_assert(std::endian::native == std::endian::little);
     constexpr uint64_t kOnes = 0x0101010101010101;
     constexpr uint64_t kHighs = 0x8080808080808080;
+    if (at > last) {
+        return std::string_view::npos;
+    }
     const bool letter = lower >= 'a' && lower <= 'z';
-    const uint64_t fold = letter ? 0x20 * kOnes : 0;  // 'C' | 0x20 is 'c'; no other byte is
+    if (!letter) {  // a byte with no case, such as a line end: memchr finds it fastest
+        const void* hit = std::memchr(source.data() + at, lower, last - at + 1);
+        return hit ? static_cast<size_t>(static_cast<const char*>(hit) - source.data())
+                   : std::string_view::npos;
+    }
+    const uint64_t fold = 0x20 * kOnes;  // 'C' | 0x20 is 'c'; no other byte is
     const uint64_t pattern = static_cast<unsigned char>(lower) * kOnes;
     for (; at + 8 <= last + 1; at += 8) {
         uint64_t word = 0;
@@ -113,7 +121,7 @@ size_t NextCandidate(std::string_view source, size_t at, size_t last, char lower
         }
     }
     for (; at <= last; ++at) {
-        if (static_cast<char>(source[at] | (letter ? 0x20 : 0)) == lower) {
+        if (static_cast<char>(source[at] | 0x20) == lower) {
             return at;
         }
     }
