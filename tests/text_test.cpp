@@ -41,9 +41,6 @@ INSTANTIATE_TEST_SUITE_P(
     [](const auto& info) { return std::string(info.param.name); });
 
 TEST(Text, InStrCountsCharactersFromOne) {
-    EXPECT_EQ(InStr(0, "Code reads", "Code reads"), 1);
-    EXPECT_EQ(InStr(0, "xx code is", "CODE IS"), 4);
-    EXPECT_EQ(InStr(0, "", "d"), 0);
     EXPECT_EQ(InStr(0, "abc", ""), 0);
     EXPECT_EQ(InStr(2, "abcabc", "abc"), 4);
     EXPECT_EQ(InStr(0, "\xC3\xA9\xC3\xA9x", "x"), 3) << "two characters of two bytes each";
