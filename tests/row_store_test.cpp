@@ -27,10 +27,8 @@ void ExpectSame(const RowStore& store, const Rows& model, const std::string& ste
     }
 }
 
-class Driver {
-  public:
-    explicit Driver(unsigned seed) : random_(seed) {}
-
+struct Driver {
+    int Pick(size_t bound) { return static_cast<int>(random() % bound); }
     // Mostly short texts, with lengths around the one- and two-byte length prefixes, some of
     // a few kilobytes to fill chunks, and now and then one larger than a whole chunk.
     std::string Text() {
@@ -48,18 +46,8 @@ class Driver {
         }
         return std::string(length, static_cast<char>('a' + Pick(26)));
     }
-    int Pick(size_t bound) { return static_cast<int>(random_() % bound); }
-
-  private:
-    std::mt19937 random_;
+    std::mt19937 random;
 };
-
-void SortModel(Rows& model, int field, bool descending) {
-    std::stable_sort(model.begin(), model.end(), [&](const auto& a, const auto& b) {
-        const int c = RuntimeStringCompare(a[field], b[field]);
-        return descending ? c > 0 : c < 0;
-    });
-}
 
 // InOrder is a list load: rows added and filled only at the end and read back at random, so rows
 // are found from the sparse places kept while they stay in order; then one earlier row changes.
@@ -73,7 +61,7 @@ class RowStoreRandomTest : public ::testing::TestWithParam<RandomCase> {};
 
 TEST_P(RowStoreRandomTest, AgreesWithAPlainVectorOfRows) {
     const auto [seed, inOrder] = GetParam();
-    Driver driver(seed);
+    Driver driver{std::mt19937(seed)};
     RowStore store(kFields);
     Rows model;
     for (int step = 0; step < 4000; ++step) {
@@ -97,7 +85,10 @@ TEST_P(RowStoreRandomTest, AgreesWithAPlainVectorOfRows) {
             const int field = driver.Pick(kFields);
             const bool descending = driver.Pick(2) == 1;
             store.SortBy(field, descending);
-            SortModel(model, field, descending);
+            std::stable_sort(model.begin(), model.end(), [&](const auto& a, const auto& b) {
+                const int c = RuntimeStringCompare(a[field], b[field]);
+                return descending ? c > 0 : c < 0;
+            });
             ExpectSame(store, model, name + " (sort)");
         } else {
             store.Clear();

@@ -58,21 +58,6 @@ class YieldTest : public WindowTest {
         return state;
     }
 
-    // Counts the cell paints inside yields, with the rows that the list had at that moment.
-    void CountCellPaints(const Ref<class Window1>& window) {
-        auto list = window->Listbox1();
-        list->CellBackgroundPaint = [this, handler = list->CellBackgroundPaint](
-                                        Listbox& sender, Ref<Graphics> g, long long row,
-                                        long long column) {
-            if (YieldIsPainting()) {
-                ++cellPaints;
-                rowsWhenPainted.push_back(sender.ListCount());
-                maxRowPainted = std::max(maxRowPainted, row);
-            }
-            return handler(sender, g, row, column);
-        };
-    }
-
     int cellPaints = 0;
     long long maxRowPainted = -1;
     std::vector<long long> rowsWhenPainted;
@@ -112,7 +97,19 @@ TEST_F(YieldTest, RowsShowBeforeTheLoopEndsAndNoOtherHandlerIsEntered) {
     auto window = StartUp();
     window->MainTabs()->Press(0);
     ProcessEvents();
-    CountCellPaints(window);
+    // The cell paints inside yields, with the rows that the list had at that moment; kept in
+    // the fixture, which outlives the window.
+    auto list = window->Listbox1();
+    list->CellBackgroundPaint = [this, handler = list->CellBackgroundPaint](
+                                    Listbox& sender, Ref<Graphics> g, long long row,
+                                    long long column) {
+        if (YieldIsPainting()) {
+            ++cellPaints;
+            rowsWhenPainted.push_back(sender.ListCount());
+            maxRowPainted = std::max(maxRowPainted, row);
+        }
+        return handler(sender, g, row, column);
+    };
     SetYieldIntervalForTesting(std::chrono::nanoseconds(0));
     const long long before = HandlersEntered();
     window->MainTabs()->Press(1);
