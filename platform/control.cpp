@@ -41,11 +41,17 @@ void Control::SetProperty(const std::string& name, const PropertyValue& value) {
         if (auto window = window_.lock()) {
             window->UpdateVisibility();
         }
-    } else if (name == "Enabled" && widget_) {
+    } else if (widget_) {
+        ApplyCommon(name, value);
+    }
+}
+
+void Control::ApplyCommon(const std::string& name, const PropertyValue& value) {
+    if (name == "Enabled") {
         widget_->setEnabled(std::get<bool>(value));
-    } else if (name == "HelpTag" && widget_) {
+    } else if (name == "HelpTag") {
         widget_->setToolTip(QString::fromStdString(std::get<std::string>(value)));
-    } else if (name == "TextColor" && widget_) {
+    } else if (name == "TextColor") {
         const Color c = std::get<ColorWord>(value).value;
         // Active and inactive only: a disabled control keeps the desktop's greyed text.
         QPalette palette = widget_->palette();
@@ -57,13 +63,19 @@ void Control::SetProperty(const std::string& name, const PropertyValue& value) {
     }
 }
 
-// The font is set once for the whole block: each setFont relays the widget out.
-void Control::PropertiesApplied() {
+bool Control::HasFont() const {
     for (const char* name : {"TextFont", "TextSize", "Bold", "Italic", "Underline"}) {
         if (Property(name)) {
-            ApplyFont();
-            return;
+            return true;
         }
+    }
+    return false;
+}
+
+// The font is set once for the whole block: each setFont relays the widget out.
+void Control::PropertiesApplied() {
+    if (HasFont()) {
+        ApplyFont();
     }
 }
 
@@ -98,8 +110,15 @@ Ref<Control> Control::Parent() const {
 void Control::AttachTo(const std::shared_ptr<::Window>& window) {
     window_ = window;
     if (widget_) {
+        Adopt();
+    }
+}
+
+void Control::Adopt() {
+    if (auto window = window_.lock()) {
         widget_->setParent(window->Client());
         widgetAdopted_ = true;
+        window->Restack(*this);
         Place();
     }
 }
@@ -108,12 +127,45 @@ void Control::SetWidget(QWidget* widget) {
     widget_ = widget;
 }
 
-QWidget& Control::LiveWidget() const {
+// Building does not change what the control is: the widget only shows its values.
+QWidget* Control::Widget() const {
+    auto& self = const_cast<Control&>(*this);
+    if (widget_ || detached_) {
+        return widget_;
+    }
+    QWidget* widget = self.BuildWidget();
+    if (!widget) {
+        return nullptr;
+    }
+    self.widget_ = widget;
+    self.Adopt();
+    for (const char* name : {"Enabled", "HelpTag", "TextColor"}) {
+        if (const PropertyValue* value = Property(name)) {
+            self.ApplyCommon(name, *value);
+        }
+    }
+    if (HasFont()) {
+        self.ApplyFont();
+    }
+    self.ApplyValues();
+    return widget_;
+}
+
+QWidget* Control::WidgetIfBuilt() const {
     RequireMainThread();
-    if (!widget_) {
+    if (detached_) {
         throw NilObjectException("The control's window is gone");
     }
-    return *widget_;
+    return widget_;
+}
+
+QWidget& Control::LiveWidget() const {
+    RequireMainThread();
+    QWidget* widget = Widget();
+    if (!widget) {
+        throw NilObjectException("The control's window is gone");
+    }
+    return *widget;
 }
 
 void Control::ApplyFont() {

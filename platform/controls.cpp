@@ -5,6 +5,7 @@
 #include <QLabel>
 #include <QPlainTextEdit>
 #include <QPushButton>
+#include <QSignalBlocker>
 #include <QStandardItemModel>
 #include <QTabWidget>
 
@@ -54,18 +55,32 @@ void PagePanel::SetValue(long long value) {
     }
 }
 
-PushButton::PushButton() {
+QWidget* PushButton::BuildWidget() {
     auto* button = new QPushButton;
-    SetWidget(button);
     QObject::connect(button, &QPushButton::clicked, Context(), [this] {
         if (Action) {
             RaiseEvent([this] { Action(*this); });
         }
     });
+    return button;
+}
+
+void PushButton::ApplyValues() {
+    for (const char* name : {"Caption", "Default"}) {
+        if (const PropertyValue* value = Property(name)) {
+            Apply(name, *value);
+        }
+    }
 }
 
 void PushButton::SetProperty(const std::string& name, const PropertyValue& value) {
     Control::SetProperty(name, value);
+    if (WidgetIfBuilt()) {
+        Apply(name, value);
+    }
+}
+
+void PushButton::Apply(const std::string& name, const PropertyValue& value) {
     auto& button = static_cast<QPushButton&>(LiveWidget());
     if (name == "Caption") {
         button.setText(QString::fromStdString(std::get<std::string>(value)));
@@ -146,22 +161,34 @@ void PopupMenu::RaiseOpen() {
     }
 }
 
-Label::Label() {
-    SetWidget(new QLabel);
+QWidget* Label::BuildWidget() {
+    return new QLabel;
+}
+
+void Label::ApplyValues() {
+    if (unshown_) {
+        static_cast<QLabel&>(LiveWidget()).setText(QString::fromStdString(*unshown_));
+        unshown_.reset();
+    }
+    ApplyAlignment();
 }
 
 void Label::SetProperty(const std::string& name, const PropertyValue& value) {
     Control::SetProperty(name, value);
     if (name == "Text") {
         SetText(std::get<std::string>(value));
-    } else if (name == "TextAlign" || name == "Multiline") {
+    } else if ((name == "TextAlign" || name == "Multiline") && WidgetIfBuilt()) {
         ApplyAlignment();
     }
 }
 
 void Label::SetText(const std::string& text) {
     text_ = ShownPrefix(text, kShownInCell);
-    static_cast<QLabel&>(LiveWidget()).setText(ShownLines(text, kShownInCell));
+    if (auto* label = static_cast<QLabel*>(WidgetIfBuilt())) {
+        label->setText(ShownLines(text, kShownInCell));
+    } else {
+        unshown_ = ShownLines(text, kShownInCell).toStdString();
+    }
 }
 
 void Label::ApplyAlignment() {
@@ -176,19 +203,38 @@ void Label::ApplyAlignment() {
     label.setTextFormat(Qt::PlainText);
 }
 
-TextArea::TextArea() {
+QWidget* TextArea::BuildWidget() {
     auto* edit = new QPlainTextEdit;
     edit->setLineWrapMode(QPlainTextEdit::WidgetWidth);
     edit->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
-    SetWidget(edit);
+    return edit;
+}
+
+void TextArea::ApplyValues() {
+    for (const char* name : {"ReadOnly", "Border", "BackColor", "ScrollbarVertical"}) {
+        if (const PropertyValue* value = Property(name)) {
+            Apply(name, *value);
+        }
+    }
+    if (unshown_) {
+        ApplyPendingFont();
+        static_cast<QPlainTextEdit&>(LiveWidget()).setPlainText(QString::fromStdString(*unshown_));
+        unshown_.reset();
+    }
 }
 
 void TextArea::SetProperty(const std::string& name, const PropertyValue& value) {
     Control::SetProperty(name, value);
-    auto& edit = static_cast<QPlainTextEdit&>(LiveWidget());
     if (name == "Text") {
         SetText(std::get<std::string>(value));
-    } else if (name == "ReadOnly") {
+    } else if (WidgetIfBuilt()) {
+        Apply(name, value);
+    }
+}
+
+void TextArea::Apply(const std::string& name, const PropertyValue& value) {
+    auto& edit = static_cast<QPlainTextEdit&>(LiveWidget());
+    if (name == "ReadOnly") {
         edit.setReadOnly(std::get<bool>(value));
     } else if (name == "Border") {
         edit.setFrameShape(std::get<bool>(value) ? QFrame::StyledPanel : QFrame::NoFrame);
@@ -204,38 +250,57 @@ void TextArea::SetProperty(const std::string& name, const PropertyValue& value) 
 }
 
 void TextArea::SetText(const std::string& text) {
-    // The text is laid out at once, in the font it will be shown in.
-    ApplyPendingFont();
     text_ = ShownPrefix(text, kShownInTextArea);
-    static_cast<QPlainTextEdit&>(LiveWidget()).setPlainText(ShownLines(text, kShownInTextArea));
+    if (auto* edit = static_cast<QPlainTextEdit*>(WidgetIfBuilt())) {
+        // The text is laid out at once, in the font it will be shown in.
+        ApplyPendingFont();
+        edit->setPlainText(ShownLines(text, kShownInTextArea));
+    } else {
+        unshown_ = ShownLines(text, kShownInTextArea).toStdString();
+    }
 }
 
-TabPanel::TabPanel() {
+QWidget* TabPanel::BuildWidget() {
     auto* tabs = new QTabWidget;
-    SetWidget(tabs);
-    QObject::connect(tabs, &QTabWidget::currentChanged, Context(), [this] {
+    QObject::connect(tabs, &QTabWidget::currentChanged, Context(), [this](int index) {
+        value_ = index;
         if (auto window = Window()) {
             window->UpdateVisibility();
         }
     });
+    return tabs;
+}
+
+// The window shows the controls of the chosen tab once the panel itself is shown.
+void TabPanel::ApplyValues() {
+    auto& tabs = static_cast<QTabWidget&>(LiveWidget());
+    const QSignalBlocker quiet(tabs);
+    for (const auto& title : titles_) {
+        tabs.addTab(new QWidget, QString::fromStdString(title));
+    }
+    tabs.setCurrentIndex(static_cast<int>(value_));
 }
 
 void TabPanel::SetProperty(const std::string& name, const PropertyValue& value) {
     Control::SetProperty(name, value);
-    auto& tabs = static_cast<QTabWidget&>(LiveWidget());
     if (name == "TabDefinition") {
         for (const auto& title : SplitRows(std::get<std::string>(value))) {
-            tabs.addTab(new QWidget, QString::fromStdString(title));
+            titles_.push_back(title);
+            if (auto* tabs = static_cast<QTabWidget*>(WidgetIfBuilt())) {
+                tabs->addTab(new QWidget, QString::fromStdString(title));
+            } else if (value_ < 0) {
+                value_ = 0;
+            }
         }
     } else if (name == "Value") {
         SetValue(std::get<long long>(value));
     }
 }
 
-long long TabPanel::Value() const {
-    return static_cast<const QTabWidget&>(LiveWidget()).currentIndex();
-}
-
 void TabPanel::SetValue(long long value) {
-    static_cast<QTabWidget&>(LiveWidget()).setCurrentIndex(static_cast<int>(value));
+    if (auto* tabs = static_cast<QTabWidget*>(WidgetIfBuilt())) {
+        tabs->setCurrentIndex(static_cast<int>(value));
+    } else if (value >= 0 && value < static_cast<long long>(titles_.size())) {
+        value_ = value;
+    }
 }

@@ -34,7 +34,7 @@ bool TakesTab(const QWidget& widget) {
 std::vector<QWidget*> FocusOrder(const std::vector<Ref<Control>>& controls) {
     std::vector<std::pair<std::vector<long long>, const Control*>> placed;
     for (const auto& control : controls) {
-        if (control->Widget() && control->IsShown() && TabStop(*control)) {
+        if (control->IsShown() && TabStop(*control) && control->Widget()) {
             placed.emplace_back(TabPath(*control), &control.Get());
         }
     }

@@ -182,12 +182,26 @@ void Window::UpdateVisibility() {
         return;
     }
     for (const auto& control : controls_) {
-        if (QWidget* widget = control->Widget()) {
-            const bool shown = control->IsShown();
+        const bool shown = control->IsShown();
+        if (QWidget* widget = shown ? control->Widget() : control->BuiltWidget()) {
             if (shown) {
                 control->ApplyPendingFont();
             }
             widget->setVisible(shown);
+        }
+    }
+}
+
+void Window::Restack(const Control& control) const {
+    auto at = std::find_if(controls_.begin(), controls_.end(),
+                           [&control](const auto& c) { return &c.Get() == &control; });
+    if (at == controls_.end()) {
+        return;
+    }
+    for (++at; at != controls_.end(); ++at) {
+        if (QWidget* above = (*at)->BuiltWidget()) {
+            control.BuiltWidget()->stackUnder(above);
+            return;
         }
     }
 }

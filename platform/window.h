@@ -61,6 +61,9 @@ class Window : public PropertyObject, public std::enable_shared_from_this<Window
     QWidget* Client() const;
     QWidget* Native() const;
     void UpdateVisibility();
+    // A widget built late goes under the widgets of the controls after it, as if it had been
+    // built in the order of the controls.
+    void Restack(const Control& control) const;
     void NativeClosed();
 
   private:

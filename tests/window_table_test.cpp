@@ -1,8 +1,10 @@
 // The window as built from its control table: one parent, indexed sets, the starting states.
 #include <QApplication>
 #include <QFontInfo>
+#include <QLabel>
 #include <QPlainTextEdit>
 #include <QPushButton>
+#include <QTabWidget>
 
 #include "shell/app.h"
 #include "shell/startup.h"
@@ -84,4 +86,32 @@ TEST_F(WindowTableTest, ATextAreaLaysItsTextOutInItsOwnFontEvenWhileHidden) {
     ASSERT_FALSE(window->TextArea2()->IsShown());
     window->TextArea2()->SetText("Bar 1 660");
     EXPECT_EQ(window->TextArea2()->Widget()->font().family(), "Courier");
+}
+
+// The report page's controls cost nothing until the page is shown; shown, they hold what they
+// were given while hidden, and lie over and under each other in the order of the table.
+TEST_F(WindowTableTest, TheReportPageBuildsItsWidgetsWhenFirstShownWithTheirValues) {
+    ASSERT_EQ(window->TextArea1()->BuiltWidget(), nullptr);
+    ASSERT_EQ(window->Label6(3)->BuiltWidget(), nullptr);
+    window->Label6(3)->SetText("Code 128");
+    window->TabPanel1()->SetValue(1);
+    window->TextArea2()->SetText("Bar 1 660");
+    // Asked for before its tab panel: built early, it must not end up under the panel.
+    QWidget* deviances = window->TextArea2()->Widget();
+
+    window->PagePanel1()->SetValue(2);
+    ProcessEvents();
+    EXPECT_EQ(static_cast<QLabel*>(window->Label6(3)->BuiltWidget())->text(), "Code 128");
+    EXPECT_EQ(static_cast<QTabWidget*>(window->TabPanel1()->BuiltWidget())->currentIndex(), 1);
+    EXPECT_EQ(static_cast<QPlainTextEdit*>(deviances)->toPlainText(), "Bar 1 660");
+    EXPECT_TRUE(deviances->isVisible());
+    EXPECT_EQ(window->TextArea1()->BuiltWidget(), nullptr) << "on the tab not chosen";
+
+    window->TabPanel1()->SetValue(0);
+    ASSERT_NE(window->TextArea1()->BuiltWidget(), nullptr);
+    EXPECT_TRUE(window->TextArea1()->BuiltWidget()->isVisible());
+    const QObjectList order = window->Client()->children();
+    const qsizetype panel = order.indexOf(window->TabPanel1()->BuiltWidget());
+    EXPECT_GT(order.indexOf(deviances), panel);
+    EXPECT_GT(order.indexOf(window->TextArea1()->BuiltWidget()), panel);
 }
