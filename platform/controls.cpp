@@ -297,6 +297,11 @@ void TabPanel::SetProperty(const std::string& name, const PropertyValue& value) 
     }
 }
 
+long long TabPanel::Value() const {
+    WidgetIfBuilt();  // a closed window's panel has no value
+    return value_;
+}
+
 void TabPanel::SetValue(long long value) {
     if (auto* tabs = static_cast<QTabWidget*>(WidgetIfBuilt())) {
         tabs->setCurrentIndex(static_cast<int>(value));

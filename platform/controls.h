@@ -98,7 +98,7 @@ class TextArea : public Control {
 class TabPanel : public Control {
   public:
     void SetProperty(const std::string& name, const PropertyValue& value) override;
-    long long Value() const { return value_; }
+    long long Value() const;
     void SetValue(long long value);
     bool IsPageContainer() const override { return true; }
     bool ShowsPage(long long tabPanelIndex) const override { return tabPanelIndex - 1 == Value(); }
