@@ -92,9 +92,10 @@ RecordSet::~RecordSet() {
     Close();
 }
 
-Ref<DatabaseField> RecordSet::Field(std::string_view name) const {
+const Ref<DatabaseField>& RecordSet::Field(std::string_view name) const {
+    static const Ref<DatabaseField> kNil;
     if (!statement_ || atEnd_) {
-        return nullptr;
+        return kNil;
     }
     int column = -1;
     // A loop asks the same names in the same order: the one behind the last is tried first.
@@ -117,21 +118,21 @@ Ref<DatabaseField> RecordSet::Field(std::string_view name) const {
             }
         }
         if (column < 0) {
-            return nullptr;
+            return kNil;
         }
         asked_.emplace_back(name, column);
     }
     const auto* text = reinterpret_cast<const char*>(sqlite3_column_text(statement_, column));
     const auto bytes = text ? static_cast<size_t>(sqlite3_column_bytes(statement_, column)) : 0;
-    std::shared_ptr<DatabaseField>& field = fields_[static_cast<size_t>(column)];
-    if (!field || field.use_count() > 1) {
+    Ref<DatabaseField>& field = fields_[static_cast<size_t>(column)];
+    if (!field || field.Shared().use_count() > 1) {
         if (field) {
             field->Keep();  // it stays with its holder
         }
-        field = std::make_shared<DatabaseField>();
+        field = New<DatabaseField>();
     }
     field->Refer(text ? text : "", bytes);
-    return Ref<DatabaseField>(field);
+    return field;
 }
 
 // A failure while stepping ends the rows, as the end of the result would.
@@ -144,7 +145,7 @@ void RecordSet::MoveNext() {
 
 void RecordSet::KeepHeldFields() {
     for (const auto& field : fields_) {
-        if (field && field.use_count() > 1) {
+        if (field && field.Shared().use_count() > 1) {
             field->Keep();
         }
     }

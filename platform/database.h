@@ -45,8 +45,9 @@ class RecordSet {
 
     // EOF of the platform (EOF itself is a macro of the C library): true behind the last row.
     bool Eof() const { return atEnd_; }
-    // The column of the current row, found by name, case aside; Nil for no such column.
-    Ref<DatabaseField> Field(std::string_view name) const;
+    // The column of the current row, found by name, case aside; Nil for no such column. The
+    // reference is to the record set's own: a caller that keeps the field keeps a copy.
+    const Ref<DatabaseField>& Field(std::string_view name) const;
     void MoveNext();
     void Close();
 
@@ -62,7 +63,7 @@ class RecordSet {
     mutable size_t nextAsked_ = 0;
     // One field object for each column, handed out again once its last holder has let go, so
     // a loop over a million rows allocates nothing per field.
-    mutable std::vector<std::shared_ptr<DatabaseField>> fields_;
+    mutable std::vector<Ref<DatabaseField>> fields_;
 };
 
 class SQLiteDatabase {
