@@ -39,13 +39,53 @@ std::optional<std::string_view> Behind(std::string_view line, std::string_view m
 std::string ValueBehind(std::string_view line, std::string_view marker) {
     return std::string(Behind(line, marker).value_or(std::string_view()));
 }
+char Lower(char c) {
+    return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c;
+}
+
+// Where the ASCII `marker` first stands in `line`, case aside; npos where it does not.
+size_t FindMarker(std::string_view line, std::string_view marker) {
+    if (marker.size() > line.size()) {
+        return std::string_view::npos;
+    }
+    const char first = Lower(marker[0]);
+    for (size_t at = 0, last = line.size() - marker.size(); at <= last; ++at) {
+        if (Lower(line[at]) != first) {
+            continue;
+        }
+        size_t i = 1;
+        while (i < marker.size() && Lower(line[at + i]) == Lower(marker[i])) {
+            ++i;
+        }
+        if (i == marker.size()) {
+            return at;
+        }
+    }
+    return std::string_view::npos;
+}
+
+// Behind() for the list, which reads a value from every row of a store: with the marker
+// known to be ASCII, the search needs neither decoding nor the general field splitter.
+std::optional<std::string_view> ReadValueBehind(std::string_view line) {
+    const size_t at = FindMarker(line, kCodeReads);
+    if (at == std::string_view::npos) {
+        return std::nullopt;
+    }
+    const std::string_view rest = line.substr(at + kCodeReads.size());
+    return rest.substr(0, FindMarker(rest, kCodeReads));
+}
 }  // namespace
 
 std::string ListReadValue(std::string_view text) {
-    if (const auto value = Behind(LineView(text, 1), kCodeReads)) {
+    const size_t firstEnd = text.find(kLineEnd[0]);
+    if (const auto value = ReadValueBehind(text.substr(0, firstEnd))) {
         return std::string(*value);
     }
-    return ValueBehind(LineView(text, 2), kCodeReads);
+    if (firstEnd == std::string_view::npos) {
+        return {};
+    }
+    const std::string_view second = text.substr(firstEnd + 1);
+    return std::string(ReadValueBehind(second.substr(0, second.find(kLineEnd[0]))).value_or(""));
 }
 
 std::string ReportReadValue(const std::string& text) {

@@ -3,6 +3,11 @@
 
 #include <gtest/gtest.h>
 
+#include <optional>
+#include <random>
+
+#include "platform/text.h"
+
 namespace {
 
 const std::string kLayoutA =
@@ -97,3 +102,34 @@ TEST(ReportText, MissingAndReversedBlockMarkers) {
 }
 
 }  // namespace
+
+// The list's reader against the plain rule, read through the general field splitter, on
+// texts made of the pieces that trip a search: markers in any case, cut markers, line ends,
+// bytes beyond ASCII and bytes that fold to a marker's letters only by a wrong fold.
+TEST(ReportText, TheListsReaderAgreesWithTheFieldSplitterOnRandomTexts) {
+    const auto behind = [](std::string_view line) -> std::optional<std::string_view> {
+        const std::string_view before = NthFieldView(line, "Code reads", 1);
+        if (before.size() == line.size()) {
+            return std::nullopt;
+        }
+        return NthFieldView(line.substr(before.size() + 10), "Code reads", 1);
+    };
+    const auto rule = [&](std::string_view text) {
+        if (const auto value = behind(NthFieldView(text, "\r", 1))) {
+            return std::string(*value);
+        }
+        return std::string(behind(NthFieldView(text, "\r", 2)).value_or(""));
+    };
+    const std::vector<std::string> pieces = {
+        "Code reads", "code READS", "Code read", "C",  "c",        "ode reads",
+        "\r",         "\r\n",       " ",         "42", "\xC3\xA9", std::string("Code\0reads", 10),
+        "\xE3",       "@",          "s"};
+    std::mt19937 random(7);
+    for (int i = 0; i < 20000; ++i) {
+        std::string text;
+        for (int n = static_cast<int>(random() % 12); n > 0; --n) {
+            text += pieces[random() % pieces.size()];
+        }
+        ASSERT_EQ(ListReadValue(text), rule(text)) << text;
+    }
+}
