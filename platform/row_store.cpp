@@ -73,24 +73,27 @@ void RowStore::SetFieldCount(int fieldCount) {
 
 void RowStore::AddRow() {
     CommitTail();
-    tail_.resize(static_cast<size_t>(fieldCount_));
-    for (std::string& text : tail_) {
-        text.clear();
+    if (chunks_.empty()) {
+        chunks_.push_back({std::make_unique_for_overwrite<char[]>(kChunkSize), kChunkSize, 0});
     }
+    tailRecord_ = (static_cast<uint64_t>(chunks_.size() - 1) << 32) | chunks_.back().used;
+    tailFields_ = 0;
     tailOpen_ = true;
     ++count_;
 }
 
 std::string_view RowStore::Field(size_t row, int field) const {
     if (tailOpen_ && row + 1 == count_) {
-        return tail_[static_cast<size_t>(field)];
+        return field < tailFields_ ? FieldOf(RecordAt(tailRecord_), field) : std::string_view();
     }
     return FieldOf(RecordAt(Location(row)), field);
 }
 
 void RowStore::SetField(size_t row, int field, std::string_view text) {
-    if (tailOpen_ && row + 1 == count_) {
-        tail_[static_cast<size_t>(field)].assign(text);
+    if (tailOpen_ && row + 1 == count_ && field == tailFields_) {
+        char* out = PutLength(ExtendTail(LengthSize(text.size()) + text.size()), text.size());
+        std::memcpy(out, text.data(), text.size());
+        ++tailFields_;
         return;
     }
     CommitTail();
@@ -120,23 +123,40 @@ void RowStore::SetField(size_t row, int field, std::string_view text) {
     ReleaseIfHuge(scratch_, kChunkSize);
 }
 
-// The row being filled becomes one record behind the last, in a single pass.
+// Room for `bytes` more of the row being filled. A record never spans two chunks: one that
+// outgrows its chunk moves, whole, to a new one.
+char* RowStore::ExtendTail(size_t bytes) {
+    Chunk* chunk = &chunks_.back();
+    const size_t start = tailRecord_ & kOffsetMask;
+    if (chunk->used + bytes > chunk->size) {
+        const size_t written = chunk->used - start;
+        const size_t size = std::max(written + bytes, kChunkSize);
+        auto moved = std::make_unique_for_overwrite<char[]>(size);
+        std::memcpy(moved.get(), chunk->bytes.get() + start, written);
+        chunk->used = start;
+        if (start == 0) {
+            chunks_.pop_back();  // it held nothing else
+        }
+        chunks_.push_back({std::move(moved), size, written});
+        chunk = &chunks_.back();
+        tailRecord_ = static_cast<uint64_t>(chunks_.size() - 1) << 32;
+    }
+    char* out = chunk->bytes.get() + chunk->used;
+    chunk->used += bytes;
+    return out;
+}
+
+// The row being filled gets empty texts for the fields it never got, and is the last record.
 void RowStore::CommitTail() {
     if (!tailOpen_) {
         return;
     }
     tailOpen_ = false;
-    size_t bytes = 0;
-    for (const std::string& text : tail_) {
-        bytes += LengthSize(text.size()) + text.size();
+    if (tailFields_ < fieldCount_) {
+        const auto missing = static_cast<size_t>(fieldCount_ - tailFields_);
+        std::memset(ExtendTail(missing), 0, missing);  // a length 0 is one zero byte
     }
-    char* out = Reserve(bytes);
-    for (std::string& text : tail_) {
-        out = PutLength(out, text.size());
-        std::memcpy(out, text.data(), text.size());
-        out += text.size();
-        ReleaseIfHuge(text, kChunkSize);
-    }
+    lastRecord_ = tailRecord_;
     const size_t row = count_ - 1;
     if (!inOrder_) {
         places_.push_back(lastRecord_);
@@ -154,7 +174,6 @@ void RowStore::DropLastRecord() {
 }
 
 void RowStore::Clear() {
-    tail_ = {};
     tailOpen_ = false;
     chunks_.clear();
     chunks_.shrink_to_fit();

@@ -38,6 +38,7 @@ class RowStore {
     };
 
     char* Reserve(size_t bytes);
+    char* ExtendTail(size_t bytes);
     void CommitTail();
     void DropLastRecord();
     uint64_t Location(size_t row) const;
@@ -57,8 +58,9 @@ class RowStore {
     mutable size_t foundRow_ = SIZE_MAX;
     mutable uint64_t foundAt_ = 0;
     std::string scratch_;  // the record being rebuilt, kept to spare an allocation per cell
-    // The last row while it is filled: its fields wait here and become one record when the
-    // next row comes, so filling a row copies each text once.
-    std::vector<std::string> tail_;
+    // The last row while it is filled: its record grows behind the last one as its fields
+    // come in order, so filling a row copies each text once. A field out of order closes it.
     bool tailOpen_ = false;
+    uint64_t tailRecord_ = 0;
+    int tailFields_ = 0;
 };
