@@ -39,25 +39,25 @@ std::optional<std::string_view> Behind(std::string_view line, std::string_view m
 std::string ValueBehind(std::string_view line, std::string_view marker) {
     return std::string(Behind(line, marker).value_or(std::string_view()));
 }
+
 char Lower(char c) {
     return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c;
 }
 
-// Where the ASCII `marker` first stands in `line`, case aside; npos where it does not.
-size_t FindMarker(std::string_view line, std::string_view marker) {
-    if (marker.size() > line.size()) {
+// "Code reads" as the list's search compares it: in small letters.
+constexpr std::string_view kCodeReadsLower = "code reads";
+
+// Where `lower`, ASCII in small letters, first stands in `line`, case aside; npos if nowhere.
+size_t FindMarker(std::string_view line, std::string_view lower) {
+    if (lower.size() > line.size()) {
         return std::string_view::npos;
     }
-    const char first = Lower(marker[0]);
-    for (size_t at = 0, last = line.size() - marker.size(); at <= last; ++at) {
-        if (Lower(line[at]) != first) {
-            continue;
-        }
-        size_t i = 1;
-        while (i < marker.size() && Lower(line[at + i]) == Lower(marker[i])) {
+    for (size_t at = 0, last = line.size() - lower.size(); at <= last; ++at) {
+        size_t i = 0;
+        while (i < lower.size() && Lower(line[at + i]) == lower[i]) {
             ++i;
         }
-        if (i == marker.size()) {
+        if (i == lower.size()) {
             return at;
         }
     }
@@ -67,12 +67,12 @@ size_t FindMarker(std::string_view line, std::string_view marker) {
 // Behind() for the list, which reads a value from every row of a store: with the marker
 // known to be ASCII, the search needs neither decoding nor the general field splitter.
 std::optional<std::string_view> ReadValueBehind(std::string_view line) {
-    const size_t at = FindMarker(line, kCodeReads);
+    const size_t at = FindMarker(line, kCodeReadsLower);
     if (at == std::string_view::npos) {
         return std::nullopt;
     }
-    const std::string_view rest = line.substr(at + kCodeReads.size());
-    return rest.substr(0, FindMarker(rest, kCodeReads));
+    const std::string_view rest = line.substr(at + kCodeReadsLower.size());
+    return rest.substr(0, FindMarker(rest, kCodeReadsLower));
 }
 }  // namespace
 
