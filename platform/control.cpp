@@ -139,15 +139,15 @@ QWidget* Control::Widget() const {
     }
     self.widget_ = widget;
     self.Adopt();
-    for (const char* name : {"Enabled", "HelpTag", "TextColor"}) {
-        if (const PropertyValue* value = Property(name)) {
-            self.ApplyCommon(name, *value);
-        }
+    for (const auto& [name, value] : Properties()) {
+        self.ApplyCommon(name, value);
     }
     if (HasFont()) {
         self.ApplyFont();
     }
     self.ApplyValues();
+    // Qt shows a child that was never hidden along with its window.
+    widget_->setVisible(IsShown());
     return widget_;
 }
 

@@ -66,10 +66,8 @@ QWidget* PushButton::BuildWidget() {
 }
 
 void PushButton::ApplyValues() {
-    for (const char* name : {"Caption", "Default"}) {
-        if (const PropertyValue* value = Property(name)) {
-            Apply(name, *value);
-        }
+    for (const auto& [name, value] : Properties()) {
+        Apply(name, value);
     }
 }
 
@@ -211,10 +209,8 @@ QWidget* TextArea::BuildWidget() {
 }
 
 void TextArea::ApplyValues() {
-    for (const char* name : {"ReadOnly", "Border", "BackColor", "ScrollbarVertical"}) {
-        if (const PropertyValue* value = Property(name)) {
-            Apply(name, *value);
-        }
+    for (const auto& [name, value] : Properties()) {
+        Apply(name, value);
     }
     if (unshown_) {
         ApplyPendingFont();
@@ -298,7 +294,7 @@ void TabPanel::SetProperty(const std::string& name, const PropertyValue& value) 
 }
 
 long long TabPanel::Value() const {
-    WidgetIfBuilt();  // a closed window's panel has no value
+    WidgetIfBuilt();  // raises once the window is gone, as the other controls do
     return value_;
 }
 

@@ -46,7 +46,8 @@ class RecordSet {
     // EOF of the platform (EOF itself is a macro of the C library): true behind the last row.
     bool Eof() const { return atEnd_; }
     // The column of the current row, found by name, case aside; Nil for no such column. The
-    // reference is to the record set's own: a caller that keeps the field keeps a copy.
+    // reference is the record set's own and lasts until the next MoveNext or Close: a caller
+    // that keeps the field keeps a copy of the reference, and the field keeps its text.
     const Ref<DatabaseField>& Field(std::string_view name) const;
     void MoveNext();
     void Close();

@@ -47,6 +47,7 @@ class PropertyObject {
     virtual void PropertiesApplied() {}
 
     const PropertyValue* Property(const std::string& name) const;
+    const std::map<std::string, PropertyValue>& Properties() const { return properties_; }
     bool BoolProperty(const std::string& name) const;
     long long IntegerProperty(const std::string& name) const;
     std::string StringProperty(const std::string& name) const;

@@ -4,6 +4,8 @@
 #include <QFontDatabase>
 #include <QStringList>
 
+#include "platform/text.h"
+
 namespace {
 
 // Most Linux desktops have no Arial. Fontconfig gives its metric twin in its place, but Qt
@@ -11,7 +13,7 @@ namespace {
 // start-up about a millisecond. The twin asked for by name is the same face, found at once.
 QString InstalledFamily(const std::string& family) {
     const QString name = QString::fromStdString(family);
-    if (family != "Arial") {
+    if (!TextEquals(family, "Arial")) {
         return name;
     }
     static const QString installed = [&name] {

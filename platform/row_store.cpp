@@ -129,8 +129,11 @@ char* RowStore::ExtendTail(size_t bytes) {
     Chunk* chunk = &chunks_.back();
     const size_t start = tailRecord_ & kOffsetMask;
     if (chunk->used + bytes > chunk->size) {
+        chunks_.reserve(chunks_.size() + 1);  // nothing below can fail half done
+        chunk = &chunks_.back();
         const size_t written = chunk->used - start;
-        const size_t size = std::max(written + bytes, kChunkSize);
+        // Room for the rest of the row too: a huge field is not copied again by the next.
+        const size_t size = written + bytes + kChunkSize;
         auto moved = std::make_unique_for_overwrite<char[]>(size);
         std::memcpy(moved.get(), chunk->bytes.get() + start, written);
         chunk->used = start;

@@ -64,8 +64,9 @@ size_t FindMarker(std::string_view line, std::string_view lower) {
     return std::string_view::npos;
 }
 
-// Behind() for the list, which reads a value from every row of a store: with the marker
-// known to be ASCII, the search needs neither decoding nor the general field splitter.
+// Behind() for the list, which reads a value from every row of a store: the marker's small
+// letters are known when this is compiled, so its search comes down to a few compares a byte
+// where the field splitter makes three general searches a line. Both follow the same rule.
 std::optional<std::string_view> ReadValueBehind(std::string_view line) {
     const size_t at = FindMarker(line, kCodeReadsLower);
     if (at == std::string_view::npos) {
