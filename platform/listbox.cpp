@@ -241,7 +241,7 @@ void Listbox::PressHeading(long long column) {
 }
 
 ListModel& Listbox::Rows() const {
-    if (!model_) {
+    if (!model_) [[unlikely]] {
         throw NilObjectException("The list's window is gone");
     }
     return *model_;

@@ -123,30 +123,23 @@ void RowStore::SetField(size_t row, int field, std::string_view text) {
     ReleaseIfHuge(scratch_, kChunkSize);
 }
 
-// Room for `bytes` more of the row being filled. A record never spans two chunks: one that
-// outgrows its chunk moves, whole, to a new one.
-char* RowStore::ExtendTail(size_t bytes) {
+// A record never spans two chunks: one that outgrows its chunk moves, whole, to a new one.
+char* RowStore::MoveTail(size_t bytes) {
+    chunks_.reserve(chunks_.size() + 1);  // nothing below can fail half done
     Chunk* chunk = &chunks_.back();
     const size_t start = tailRecord_ & kOffsetMask;
-    if (chunk->used + bytes > chunk->size) {
-        chunks_.reserve(chunks_.size() + 1);  // nothing below can fail half done
-        chunk = &chunks_.back();
-        const size_t written = chunk->used - start;
-        // Room for the rest of the row too: a huge field is not copied again by the next.
-        const size_t size = written + bytes + kChunkSize;
-        auto moved = std::make_unique_for_overwrite<char[]>(size);
-        std::memcpy(moved.get(), chunk->bytes.get() + start, written);
-        chunk->used = start;
-        if (start == 0) {
-            chunks_.pop_back();  // it held nothing else
-        }
-        chunks_.push_back({std::move(moved), size, written});
-        chunk = &chunks_.back();
-        tailRecord_ = static_cast<uint64_t>(chunks_.size() - 1) << 32;
+    const size_t written = chunk->used - start;
+    // Room for the rest of the row too: a huge field is not copied again by the next.
+    const size_t size = written + bytes + kChunkSize;
+    auto moved = std::make_unique_for_overwrite<char[]>(size);
+    std::memcpy(moved.get(), chunk->bytes.get() + start, written);
+    chunk->used = start;
+    if (start == 0) {
+        chunks_.pop_back();  // it held nothing else
     }
-    char* out = chunk->bytes.get() + chunk->used;
-    chunk->used += bytes;
-    return out;
+    chunks_.push_back({std::move(moved), size, written + bytes});
+    tailRecord_ = static_cast<uint64_t>(chunks_.size() - 1) << 32;
+    return chunks_.back().bytes.get() + written;
 }
 
 // The row being filled gets empty texts for the fields it never got, and is the last record.

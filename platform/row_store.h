@@ -38,7 +38,17 @@ class RowStore {
     };
 
     char* Reserve(size_t bytes);
-    char* ExtendTail(size_t bytes);
+    // Room for `bytes` more of the row being filled, most often where it stands.
+    char* ExtendTail(size_t bytes) {
+        Chunk& chunk = chunks_.back();
+        if (chunk.used + bytes > chunk.size) {
+            return MoveTail(bytes);
+        }
+        char* out = chunk.bytes.get() + chunk.used;
+        chunk.used += bytes;
+        return out;
+    }
+    char* MoveTail(size_t bytes);
     void CommitTail();
     void DropLastRecord();
     uint64_t Location(size_t row) const;
