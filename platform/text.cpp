@@ -6,8 +6,6 @@
 
 #include <locale.h>
 #include <algorithm>
-#include <array>
-#include <bit>
 #include <charconv>
 #include <cmath>
 #include <cstdint>
@@ -28,31 +26,9 @@ struct Match {
     bool Found() const { return position != std::string_view::npos; }
 };
 
-// Eight bytes at a time: every search asks this of its separator.
 bool IsAscii(std::string_view text) {
-    uint64_t bits = 0;
-    size_t at = 0;
-    for (; at + 8 <= text.size(); at += 8) {
-        uint64_t word = 0;
-        std::memcpy(&word, text.data() + at, 8);
-        bits |= word;
-    }
-    for (; at < text.size(); ++at) {
-        bits |= static_cast<unsigned char>(text[at]);
-    }
-    return (bits & 0x8080808080808080) == 0;
-}
-
-constexpr std::array<char, 256> kFoldedAscii = [] {
-    std::array<char, 256> table{};
-    for (int c = 0; c < 256; ++c) {
-        table[static_cast<size_t>(c)] = static_cast<char>(c >= 'A' && c <= 'Z' ? c + 32 : c);
-    }
-    return table;
-}();
-
-char FoldAscii(char c) {
-    return kFoldedAscii[static_cast<unsigned char>(c)];
+    return std::all_of(text.begin(), text.end(),
+                       [](char c) { return static_cast<unsigned char>(c) < 0x80; });
 }
 
 bool IsContinuation(unsigned char byte) {
@@ -93,55 +69,11 @@ char32_t Fold(char32_t code) {
     return code < 0x110000 ? QChar::toCaseFolded(code) : code;
 }
 
-// The first place from `at` to `last` whose byte is `lower`, or for a letter its capital too;
-// npos when there is none. For a letter, eight bytes are tested at once (the lowest byte of a
-// word comes first in memory), with no call per candidate: most texts searched are short lines.
-size_t NextCandidate(std::string_view source, size_t at, size_t last, char lower) {
-    static_assert(std::endian::native == std::endian::little);
-    constexpr uint64_t kOnes = 0x0101010101010101;
-    constexpr uint64_t kHighs = 0x8080808080808080;
-    if (at > last) {
-        return std::string_view::npos;
-    }
-    const bool letter = lower >= 'a' && lower <= 'z';
-    if (!letter) {  // a byte with no case, such as a line end: memchr finds it fastest
-        const void* hit = std::memchr(source.data() + at, lower, last - at + 1);
-        return hit ? static_cast<size_t>(static_cast<const char*>(hit) - source.data())
-                   : std::string_view::npos;
-    }
-    const uint64_t fold = 0x20 * kOnes;  // 'C' | 0x20 is 'c'; no other byte is
-    const uint64_t pattern = static_cast<unsigned char>(lower) * kOnes;
-    for (; at + 8 <= last + 1; at += 8) {
-        uint64_t word = 0;
-        std::memcpy(&word, source.data() + at, 8);
-        const uint64_t x = (word | fold) ^ pattern;  // a zero byte where the byte matches
-        const uint64_t zeros = (x - kOnes) & ~x & kHighs;
-        if (zeros != 0) {
-            return at + static_cast<size_t>(std::countr_zero(zeros) / 8);
-        }
-    }
-    for (; at <= last; ++at) {
-        if (static_cast<char>(source[at] | 0x20) == lower) {
-            return at;
-        }
-    }
-    return std::string_view::npos;
-}
-
 Match FindAscii(std::string_view source, size_t from, std::string_view find) {
-    const char lower = FoldAscii(find[0]);
-    const size_t last = source.size() - find.size();
-    for (size_t at = NextCandidate(source, from, last, lower); at != std::string_view::npos;
-         at = NextCandidate(source, at + 1, last, lower)) {
-        size_t i = 1;
-        while (i < find.size() && FoldAscii(source[at + i]) == FoldAscii(find[i])) {
-            ++i;
-        }
-        if (i == find.size()) {
-            return {at, find.size()};
-        }
-    }
-    return {};
+    std::string lower(find);
+    std::transform(lower.begin(), lower.end(), lower.begin(), FoldAscii);
+    const size_t at = FindLowerAscii(source, lower, from);
+    return at == std::string_view::npos ? Match{} : Match{at, find.size()};
 }
 
 Match FindFolded(std::string_view source, size_t from, std::string_view find) {

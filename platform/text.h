@@ -2,6 +2,7 @@
 // text, whole-text separators. Invalid UTF-8 is taken byte by byte and never fails.
 #pragma once
 
+#include <cstring>
 #include <string>
 #include <string_view>
 
@@ -9,6 +10,39 @@ std::string NthField(std::string_view source, std::string_view separator, long l
 // NthField without the copy: a view into `source`.
 std::string_view NthFieldView(std::string_view source, std::string_view separator, long long n);
 long long CountFields(std::string_view source, std::string_view separator);
+
+// An ASCII capital as its small letter; every other byte as it is.
+inline char FoldAscii(char c) {
+    return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c;
+}
+
+// Byte offset of the first `lower`, case aside, in `source` from byte `from`; npos where there
+// is none. `lower` is ASCII in small letters, so the search is byte by byte. Inline, so that a
+// reader that looks for the same marker row after row compares against its known letters.
+inline size_t FindLowerAscii(std::string_view source, std::string_view lower, size_t from = 0) {
+    if (lower.empty() || from > source.size() || lower.size() > source.size() - from) {
+        return std::string_view::npos;
+    }
+    const size_t last = source.size() - lower.size();
+    const bool letter = lower[0] >= 'a' && lower[0] <= 'z';
+    for (size_t at = from; at <= last; ++at) {
+        if (!letter) {  // a byte with no case, such as a line end: memchr finds it fastest
+            const void* hit = std::memchr(source.data() + at, lower[0], last - at + 1);
+            if (!hit) {
+                return std::string_view::npos;
+            }
+            at = static_cast<size_t>(static_cast<const char*>(hit) - source.data());
+        }
+        size_t i = 0;
+        while (i < lower.size() && FoldAscii(source[at + i]) == lower[i]) {
+            ++i;
+        }
+        if (i == lower.size()) {
+            return at;
+        }
+    }
+    return std::string_view::npos;
+}
 // Position of the first occurrence of `find` at or after character `start` (0 or 1 mean the
 // beginning), counted in characters from 1; 0 when there is none or `find` is empty.
 long long InStr(long long start, std::string_view source, std::string_view find);

@@ -20,11 +20,6 @@ std::string_view LineView(std::string_view text, long long n) {
     return NthFieldView(text, kLineEnd, n);
 }
 
-// Whether `line` holds `marker`, case aside.
-bool Has(std::string_view line, std::string_view marker) {
-    return NthFieldView(line, marker, 1).size() != line.size();
-}
-
 // The text behind the first `marker` on `line`, case aside, up to its next occurrence; none
 // when the line lacks the marker.
 std::optional<std::string_view> Behind(std::string_view line, std::string_view marker) {
@@ -40,40 +35,19 @@ std::string ValueBehind(std::string_view line, std::string_view marker) {
     return std::string(Behind(line, marker).value_or(std::string_view()));
 }
 
-char Lower(char c) {
-    return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c;
-}
-
 // "Code reads" as the list's search compares it: in small letters.
 constexpr std::string_view kCodeReadsLower = "code reads";
 
-// Where `lower`, ASCII in small letters, first stands in `line`, case aside; npos if nowhere.
-size_t FindMarker(std::string_view line, std::string_view lower) {
-    if (lower.size() > line.size()) {
-        return std::string_view::npos;
-    }
-    for (size_t at = 0, last = line.size() - lower.size(); at <= last; ++at) {
-        size_t i = 0;
-        while (i < lower.size() && Lower(line[at + i]) == lower[i]) {
-            ++i;
-        }
-        if (i == lower.size()) {
-            return at;
-        }
-    }
-    return std::string_view::npos;
-}
-
-// Behind() for the list, which reads a value from every row of a store: the marker's small
-// letters are known when this is compiled, so its search comes down to a few compares a byte
-// where the field splitter makes three general searches a line. Both follow the same rule.
+// Behind() for the list, which reads a value from every row of a store: one search for the
+// marker in small letters, where the field splitter makes three general searches a line.
+// Both follow the same rule.
 std::optional<std::string_view> ReadValueBehind(std::string_view line) {
-    const size_t at = FindMarker(line, kCodeReadsLower);
+    const size_t at = FindLowerAscii(line, kCodeReadsLower);
     if (at == std::string_view::npos) {
         return std::nullopt;
     }
     const std::string_view rest = line.substr(at + kCodeReadsLower.size());
-    return rest.substr(0, FindMarker(rest, kCodeReadsLower));
+    return rest.substr(0, FindLowerAscii(rest, kCodeReadsLower));
 }
 }  // namespace
 
@@ -107,7 +81,7 @@ std::string ReportCodeType(const std::string& text) {
 
 bool PassesReportTest(const std::string& text) {
     const std::string_view first = LineView(text, 1);
-    return Has(first, kCodeReads) || Has(first, kCodeIs);
+    return Behind(first, kCodeReads) || Behind(first, kCodeIs);
 }
 
 std::string SymbolLength(const std::string& text) {
