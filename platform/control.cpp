@@ -63,19 +63,13 @@ void Control::ApplyCommon(const std::string& name, const PropertyValue& value) {
     }
 }
 
-bool Control::HasFont() const {
-    for (const char* name : {"TextFont", "TextSize", "Bold", "Italic", "Underline"}) {
-        if (Property(name)) {
-            return true;
-        }
-    }
-    return false;
-}
-
 // The font is set once for the whole block: each setFont relays the widget out.
 void Control::PropertiesApplied() {
-    if (HasFont()) {
-        ApplyFont();
+    for (const char* name : {"TextFont", "TextSize", "Bold", "Italic", "Underline"}) {
+        if (Property(name)) {
+            ApplyFont();
+            return;
+        }
     }
 }
 
@@ -118,7 +112,6 @@ void Control::Adopt() {
     if (auto window = window_.lock()) {
         widget_->setParent(window->Client());
         widgetAdopted_ = true;
-        window->Restack(*this);
         Place();
     }
 }
@@ -139,12 +132,14 @@ QWidget* Control::Widget() const {
     }
     self.widget_ = widget;
     self.Adopt();
+    if (auto window = window_.lock()) {
+        window->Restack(*this);
+    }
     for (const auto& [name, value] : Properties()) {
         self.ApplyCommon(name, value);
+        self.Apply(name, value);
     }
-    if (HasFont()) {
-        self.ApplyFont();
-    }
+    self.Control::PropertiesApplied();
     self.ApplyValues();
     // Qt shows a child that was never hidden along with its window.
     widget_->setVisible(IsShown());

@@ -67,6 +67,8 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     // A control whose widget costs more than it is worth before its page is shown builds it
     // here, at its first show or its first use; the widget then gets the control's values.
     virtual QWidget* BuildWidget() { return nullptr; }
+    // One kept value on the built widget, then what the control keeps outside its values.
+    virtual void Apply(const std::string& /*name*/, const PropertyValue& /*value*/) {}
     virtual void ApplyValues() {}
     // The widget if it is built, nullptr if not yet, or NilObjectException once the window
     // that showed it is gone.
@@ -99,5 +101,4 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     void SetWidgetFont();
     void Adopt();
     void ApplyCommon(const std::string& name, const PropertyValue& value);
-    bool HasFont() const;
 };

@@ -65,12 +65,6 @@ QWidget* PushButton::BuildWidget() {
     return button;
 }
 
-void PushButton::ApplyValues() {
-    for (const auto& [name, value] : Properties()) {
-        Apply(name, value);
-    }
-}
-
 void PushButton::SetProperty(const std::string& name, const PropertyValue& value) {
     Control::SetProperty(name, value);
     if (WidgetIfBuilt()) {
@@ -209,9 +203,6 @@ QWidget* TextArea::BuildWidget() {
 }
 
 void TextArea::ApplyValues() {
-    for (const auto& [name, value] : Properties()) {
-        Apply(name, value);
-    }
     if (unshown_) {
         ApplyPendingFont();
         static_cast<QPlainTextEdit&>(LiveWidget()).setPlainText(QString::fromStdString(*unshown_));

@@ -38,8 +38,7 @@ class PushButton : public Control {
 
   private:
     QWidget* BuildWidget() override;
-    void ApplyValues() override;
-    void Apply(const std::string& name, const PropertyValue& value);
+    void Apply(const std::string& name, const PropertyValue& value) override;
 };
 
 // A popup of text rows. A row "-" is drawn as a dividing line; it can still be chosen by
@@ -87,8 +86,8 @@ class TextArea : public Control {
 
   private:
     QWidget* BuildWidget() override;
+    void Apply(const std::string& name, const PropertyValue& value) override;
     void ApplyValues() override;
-    void Apply(const std::string& name, const PropertyValue& value);
     std::string text_;
     std::optional<std::string> unshown_;  // what a widget not built yet is to show
 };
