@@ -34,9 +34,14 @@ constexpr qint64 kOpenWaitLimitMs = 500;
 
 std::vector<QPointer<QWidget>> heldWindows;
 
+// Shown, but not yet on screen: Qt has not handled the expose that maps it.
+bool IsUnmapped(const QWidget* window) {
+    return window->isVisible() && !window->testAttribute(Qt::WA_Mapped);
+}
+
 bool WindowsOnScreen() {
     for (QWidget* window : QApplication::topLevelWidgets()) {
-        if (window->isVisible() && !window->testAttribute(Qt::WA_Mapped)) {
+        if (IsUnmapped(window)) {
             return false;
         }
     }
@@ -48,7 +53,7 @@ bool WindowsOnScreen() {
 // page would only show it for an instant, at the price of its fonts and text layout.
 void HoldFirstPaint() {
     for (QWidget* window : QApplication::topLevelWidgets()) {
-        if (window->isVisible() && !window->testAttribute(Qt::WA_Mapped)) {
+        if (IsUnmapped(window)) {
             window->setUpdatesEnabled(false);
             heldWindows.emplace_back(window);
         }
