@@ -43,10 +43,12 @@ TEST_F(ShellTest, MainPaintsTheEmptyListFirstAndNeverTheInstallationPage) {
         int installPage = 0;
         int listPage = 0;
         bool eventFilter(QObject* watched, QEvent* event) override {
-            auto window = Cast<class Window1>(_GetImplicitWindow("Window1.Window1"));
-            if (event->type() == QEvent::Paint && window) {
+            if (event->type() != QEvent::Paint) {
+                return false;
+            }
+            if (auto window = Cast<class Window1>(_GetImplicitWindow("Window1.Window1"))) {
                 auto* list = static_cast<QTableView*>(window->Listbox1()->Widget());
-                installPage += watched == window->PushButton1()->Widget() ? 1 : 0;
+                installPage += watched == window->PushButton1()->BuiltWidget() ? 1 : 0;
                 listPage += watched == list->viewport() ? 1 : 0;
             }
             return false;
