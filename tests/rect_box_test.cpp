@@ -95,10 +95,4 @@ TEST(RectBox, FrameOfTwoHasNoHairlinesAndAFlatBand) {
     EXPECT_EQ(image.pixel(W / 2, H - 2), kGround);
 }
 
-TEST(RectBox, APaintWithoutGraphicsIsDropped) {
-    RectBox box;
-    box.title = "x";
-    EXPECT_NO_THROW(box.Event_Paint(nullptr, {}));
-}
-
 }  // namespace

@@ -60,17 +60,6 @@ INSTANTIATE_TEST_SUITE_P(
         ReaderCase{"CrLfEndings", "Code reads 5\r\nCode is EAN 8\r\n", " 5", " 5", " EAN 8", true}),
     [](const auto& info) { return std::string(info.param.name); });
 
-TEST(ReportText, LinesFourToEightAndTheBlocks) {
-    EXPECT_EQ(SymbolLength(kLayoutA), " 29.83 mm");
-    EXPECT_EQ(Scale(kLayoutA), " 80 %");
-    EXPECT_EQ(Bwr(kLayoutA), " 15 mic");
-    EXPECT_EQ(BarDeviance(kLayoutA), " 6 mic");
-    EXPECT_EQ(FreeLine(kLayoutA), "All bars within tolerance");
-    EXPECT_EQ(MeasurementsBlock(kLayoutA), "\rBar 1 330\rBar 2 660\r");
-    EXPECT_EQ(DeviancesBlock(kLayoutA), "\rBar 1 +4\rBar 2 -2");
-    EXPECT_EQ(SymbolLength(kLayoutB), " 29.83 mm");
-}
-
 TEST(ReportText, AMarkerOnTheWrongLineGivesNothing) {
     const std::string text = "Code reads 1\rCode is 2\r\rBar Deviance 6\rSymbol Length 3";
     EXPECT_EQ(SymbolLength(text) + BarDeviance(text) + Scale(text) + FreeLine(text), "");

@@ -121,16 +121,4 @@ INSTANTIATE_TEST_SUITE_P(Seeds, RowStoreRandomTest,
                                     std::to_string(info.param.seed);
                          });
 
-TEST(RowStoreTest, SortReturnsTheOldPositionOfEachRow) {
-    RowStore store(1);
-    for (const char* text : {"b", "A", "c", "a"}) {
-        store.AddRow();
-        store.SetField(store.Count() - 1, 0, text);
-    }
-    const std::vector<uint32_t> order = store.SortBy(0, false);
-    EXPECT_EQ(order, (std::vector<uint32_t>{1, 3, 0, 2})) << "equal rows keep their order";
-    EXPECT_EQ(store.Field(0, 0), "A");
-    EXPECT_EQ(store.Field(3, 0), "c");
-}
-
 }  // namespace
