@@ -10,11 +10,7 @@ namespace fs = std::filesystem;
 
 namespace {
 
-class FolderItemTest : public ::testing::Test {
-  protected:
-    TempDir tree;
-    ScopedRoot root{tree.Path()};
-};
+class FolderItemTest : public RootedTest {};
 
 TEST_F(FolderItemTest, ShellPathsRoundTripWithoutTheRoot) {
     fs::create_directories(tree.Path() / "Users/user/Library/Application Support/Adobe");

@@ -15,10 +15,6 @@ namespace fs = std::filesystem;
 
 namespace {
 
-demo::StoredResult Result(const std::string& id, const std::string& document) {
-    return {id, "2018-11-0" + id, document, "A", "Code reads " + id + "\rCode is EAN 8"};
-}
-
 struct HostileStore {
     const char* name;
     void (*make)(const fs::path& store);

@@ -19,11 +19,7 @@
 using namespace testsupport;
 
 namespace {
-class MenuTest : public SlateTest {
-  protected:
-    TempDir tree;
-    ScopedRoot root{tree.Path()};
-};
+class MenuTest : public RootedTest {};
 
 QMenu* NativeMenu(const Ref<class Window1>& window, const char* name) {
     auto* bar = static_cast<QMainWindow*>(window->Native())->menuBar();

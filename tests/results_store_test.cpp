@@ -11,7 +11,7 @@ using namespace testsupport;
 
 namespace {
 
-class StoreTest : public ::testing::Test {
+class StoreTest : public RootedTest {
   protected:
     void Write(const std::vector<demo::StoredResult>& rows,
                const std::string& schema = demo::kSchema) {
@@ -27,8 +27,6 @@ class StoreTest : public ::testing::Test {
         db.Close();
         return count;
     }
-    TempDir tree;
-    ScopedRoot root{tree.Path()};
     std::filesystem::path store = demo::StorePath(tree.Path());
 };
 

@@ -104,4 +104,11 @@ class SlateTest : public ::testing::Test {
     }
 };
 
+// A slate whose file-system root is a temporary tree of its own.
+class RootedTest : public SlateTest {
+  protected:
+    TempDir tree;
+    ScopedRoot root{tree.Path()};
+};
+
 }  // namespace testsupport

@@ -12,7 +12,12 @@
 
 namespace testsupport {
 
-class WindowTest : public SlateTest {
+// A stored row dated by its id, which is also its read value.
+inline demo::StoredResult Result(const std::string& id, const std::string& document) {
+    return {id, "2018-11-0" + id, document, "A", "Code reads " + id + "\rCode is EAN 8"};
+}
+
+class WindowTest : public RootedTest {
   protected:
     // The start-up that the event loop would run, without the loop.
     Ref<class Window1> StartUp() {
@@ -55,9 +60,6 @@ class WindowTest : public SlateTest {
         }
         return cells;
     }
-
-    TempDir tree;
-    ScopedRoot root{tree.Path()};
 };
 
 }  // namespace testsupport

@@ -15,14 +15,12 @@ using namespace testsupport;
 
 namespace {
 
-class WindowTableTest : public SlateTest {
+class WindowTableTest : public RootedTest {
   protected:
     void SetUp() override {
         _EarlyStartup();
         window = Window1();
     }
-    TempDir tree;
-    ScopedRoot root{tree.Path()};
     Ref<class Window1> window;
 };
 
