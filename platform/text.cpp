@@ -139,6 +139,37 @@ bool IsTrimmed(char c) {
 
 }  // namespace
 
+size_t FindLowerAsciiInLongText(std::string_view source, std::string_view lower, size_t from) {
+    const char* const begin = source.data();
+    const char* const end = begin + (source.size() - lower.size()) + 1;  // behind the last start
+    const auto next = [end](const char* at, char c) {
+        const void* hit = std::memchr(at, c, static_cast<size_t>(end - at));
+        return hit ? static_cast<const char*>(hit) : end;
+    };
+    const char small = lower[0];
+    const char capital = static_cast<char>(small - ('a' - 'A'));
+    const char* nextSmall = next(begin + from, small);
+    const char* nextCapital = next(begin + from, capital);
+    for (;;) {
+        const char* at = std::min(nextSmall, nextCapital);
+        if (at == end) {
+            return std::string_view::npos;
+        }
+        size_t i = 1;
+        while (i < lower.size() && FoldAscii(at[i]) == lower[i]) {
+            ++i;
+        }
+        if (i == lower.size()) {
+            return static_cast<size_t>(at - begin);
+        }
+        if (at == nextSmall) {
+            nextSmall = next(at + 1, small);
+        } else {
+            nextCapital = next(at + 1, capital);
+        }
+    }
+}
+
 std::string_view NthFieldView(std::string_view source, std::string_view separator, long long n) {
     if (n < 1) {
         return {};

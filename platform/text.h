@@ -19,12 +19,19 @@ inline char FoldAscii(char c) {
 // Byte offset of the first `lower`, case aside, in `source` from byte `from`; npos where there
 // is none. `lower` is ASCII in small letters, so the search is byte by byte. Inline, so that a
 // reader that looks for the same marker row after row compares against its known letters.
+// A long text whose `lower` starts with a letter is searched out of line, by memchr for both
+// forms of the letter: a huge report line is scanned as fast as a line end is found.
+size_t FindLowerAsciiInLongText(std::string_view source, std::string_view lower, size_t from);
+
 inline size_t FindLowerAscii(std::string_view source, std::string_view lower, size_t from = 0) {
     if (lower.empty() || from > source.size() || lower.size() > source.size() - from) {
         return std::string_view::npos;
     }
     const size_t last = source.size() - lower.size();
     const bool letter = lower[0] >= 'a' && lower[0] <= 'z';
+    if (letter && last - from > 256) {
+        return FindLowerAsciiInLongText(source, lower, from);
+    }
     for (size_t at = from; at <= last; ++at) {
         if (!letter) {  // a byte with no case, such as a line end: memchr finds it fastest
             const void* hit = std::memchr(source.data() + at, lower[0], last - at + 1);

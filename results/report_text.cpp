@@ -20,6 +20,11 @@ std::string_view LineView(std::string_view text, long long n) {
     return NthFieldView(text, kLineEnd, n);
 }
 
+// Whether `line` holds `marker`, case aside: one search, where Behind() makes two.
+bool Has(std::string_view line, std::string_view marker) {
+    return NthFieldView(line, marker, 1).size() != line.size();
+}
+
 // The text behind the first `marker` on `line`, case aside, up to its next occurrence; none
 // when the line lacks the marker.
 std::optional<std::string_view> Behind(std::string_view line, std::string_view marker) {
@@ -81,7 +86,7 @@ std::string ReportCodeType(const std::string& text) {
 
 bool PassesReportTest(const std::string& text) {
     const std::string_view first = LineView(text, 1);
-    return Behind(first, kCodeReads) || Behind(first, kCodeIs);
+    return Has(first, kCodeReads) || Has(first, kCodeIs);
 }
 
 std::string SymbolLength(const std::string& text) {
