@@ -4,12 +4,19 @@
 #include <QFont>
 #include <QPainter>
 #include <QPainterPath>
+#include <QRegion>
 
 #include <algorithm>
 #include <cmath>
 
 #include "platform/qt_color.h"
 #include "platform/qt_font.h"
+
+namespace {
+bool IsWhole(double value) {
+    return std::floor(value) == value;
+}
+}  // namespace
 
 Graphics::Graphics(QPainter& painter, int width, int height, Color ground)
     : painter_(painter), width_(width), height_(height), ground_(ground) {
@@ -33,8 +40,8 @@ void Graphics::DrawRect(double x, double y, double width, double height) {
     const QColor color = ToQColor(ForeColor, Transparency);
     painter_.fillRect(QRectF(x, y, width, ph), color);
     painter_.fillRect(QRectF(x, y + height - ph, width, ph), color);
-    painter_.fillRect(QRectF(x, y + ph, pw, height - 2 * ph), color);
-    painter_.fillRect(QRectF(x + width - pw, y + ph, pw, height - 2 * ph), color);
+    FillRows(QRectF(x, y + ph, pw, height - 2 * ph), color);
+    FillRows(QRectF(x + width - pw, y + ph, pw, height - 2 * ph), color);
 }
 
 void Graphics::DrawRoundRect(double x, double y, double width, double height, double arcWidth,
@@ -46,10 +53,44 @@ void Graphics::DrawRoundRect(double x, double y, double width, double height, do
     ring.addRoundedRect(QRectF(x, y, width, height), arcWidth / 2, arcHeight / 2);
     ring.addRoundedRect(QRectF(x + pw, y + ph, width - 2 * pw, height - 2 * ph),
                         std::max(0.0, arcWidth / 2 - pw), std::max(0.0, arcHeight / 2 - ph));
+    const QColor color = ToQColor(ForeColor, Transparency);
     painter_.save();
     painter_.setRenderHint(QPainter::Antialiasing, true);
-    painter_.fillPath(ring, ToQColor(ForeColor, Transparency));
+    // Below the top corners and above the bottom ones, on whole pixels, each side of the ring
+    // is a column of fully covered pixels: filled as rectangles, the tall sides give the same
+    // pixels without going through the blend of many spans (see FillRows).
+    const double corner = std::ceil(std::max(std::min(arcHeight / 2, height / 2), ph));
+    if (IsWhole(x) && IsWhole(y) && IsWhole(width) && IsWhole(height) && IsWhole(pw) &&
+        2 * corner < height) {
+        painter_.save();
+        const QRegion corners = QRegion(QRectF(x, y, width, corner).toRect()) +
+                                QRect(QRectF(x, y + height - corner, width, corner).toRect());
+        painter_.setClipRegion(corners, Qt::IntersectClip);
+        painter_.fillPath(ring, color);
+        painter_.restore();
+        painter_.setRenderHint(QPainter::Antialiasing, false);
+        FillRows(QRectF(x, y + corner, pw, height - 2 * corner), color);
+        FillRows(QRectF(x + width - pw, y + corner, pw, height - 2 * corner), color);
+    } else {
+        painter_.fillPath(ring, color);
+    }
     painter_.restore();
+}
+
+// Qt's raster engine hands any blend of more than 95 spans, rows for a rectangle, to its thread
+// pool and waits for the threads: for a translucent side as tall as a page, that is a thread
+// start and several hand-offs in a single paint, slower than blending on this thread. An opaque
+// rectangle is a plain fill and needs no such care.
+void Graphics::FillRows(const QRectF& area, const QColor& color) {
+    if (color.alpha() == 255) {
+        painter_.fillRect(area, color);
+        return;
+    }
+    for (double top = area.top(); top < area.bottom(); top += kBlendRows) {
+        painter_.fillRect(
+            QRectF(area.left(), top, area.width(), std::min(kBlendRows, area.bottom() - top)),
+            color);
+    }
 }
 
 void Graphics::DrawLine(double x1, double y1, double x2, double y2) {

@@ -6,7 +6,9 @@
 
 #include "platform/color.h"
 
+class QColor;
 class QPainter;
+class QRectF;
 
 class Graphics {
   public:
@@ -36,6 +38,9 @@ class Graphics {
                     bool condense = false);
 
   private:
+    static constexpr double kBlendRows = 64;
+    void FillRows(const QRectF& area, const QColor& color);
+
     QPainter& painter_;
     int width_;
     int height_;
