@@ -83,7 +83,8 @@ TEST_F(WindowTableTest, EachControlShowsInItsTableFont) {
 TEST_F(WindowTableTest, ATextAreaLaysItsTextOutInItsOwnFontEvenWhileHidden) {
     ASSERT_FALSE(window->TextArea2()->IsShown());
     window->TextArea2()->SetText("Bar 1 660");
-    EXPECT_EQ(window->TextArea2()->Widget()->font().family(), "Courier");
+    EXPECT_EQ(QFontInfo(window->TextArea2()->Widget()->font()).family(),
+              QFontInfo(QFont("Courier")).family());
 }
 
 // The report page's controls cost nothing until the page is shown; shown, they hold what they
