@@ -122,8 +122,11 @@ const Ref<DatabaseField>& RecordSet::Field(std::string_view name) const {
         }
         asked_.emplace_back(name, column);
     }
-    const auto* text = reinterpret_cast<const char*>(sqlite3_column_text(statement_, column));
-    const auto bytes = text ? static_cast<size_t>(sqlite3_column_bytes(statement_, column)) : 0;
+    // The column's value is asked for once, rather than once for its text and once for its
+    // length: the connection is this thread's alone, so the value needs no lock around it.
+    sqlite3_value* value = sqlite3_column_value(statement_, column);
+    const auto* text = reinterpret_cast<const char*>(sqlite3_value_text(value));
+    const auto bytes = text ? static_cast<size_t>(sqlite3_value_bytes(value)) : 0;
     Ref<DatabaseField>& field = fields_[static_cast<size_t>(column)];
     if (!field || field.Shared().use_count() > 1) {
         if (field) {
