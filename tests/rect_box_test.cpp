@@ -6,6 +6,9 @@
 
 #include <gtest/gtest.h>
 
+#include <filesystem>
+#include <iterator>
+
 #include "drawing/rect_box.h"
 
 namespace {
@@ -15,15 +18,15 @@ constexpr int H = 120;
 constexpr Color kColour = 0x225684;
 const QRgb kGround = qRgb(255, 255, 255);
 
-QImage Paint(long long linesize, const std::string& title) {
-    QImage image(W, H, QImage::Format_ARGB32);
+QImage Paint(long long linesize, const std::string& title, int width = W, int height = H) {
+    QImage image(width, height, QImage::Format_ARGB32);
     image.fill(kGround);
     RectBox box;
     box.colour = kColour;
     box.linesize = linesize;
     box.title = title;
     QPainter painter(&image);
-    box.Event_Paint(New<Graphics>(painter, W, H, 0xFFFFFF), {});
+    box.Event_Paint(New<Graphics>(painter, width, height, 0xFFFFFF), {});
     return image;
 }
 
@@ -93,6 +96,25 @@ TEST(RectBox, FrameOfTwoHasNoHairlinesAndAFlatBand) {
     ExpectNear(image.pixel(W / 2, 19), Solid(), "band bottom");
     ExpectNear(image.pixel(W / 2, H - 3), Solid(), "bottom frame ends at H - L");
     EXPECT_EQ(image.pixel(W / 2, H - 2), kGround);
+}
+
+// The process keeps to one thread: Qt's raster engine would hand the blends of a frame as tall
+// as a page to threads of its own and wait for them.
+TEST(RectBox, PageSizedFramePaintsOnTheCallingThreadAlone) {
+    const std::filesystem::path tasks = "/proc/self/task";
+    if (!std::filesystem::exists(tasks)) {
+        GTEST_SKIP() << "threads are counted in /proc";
+    }
+    const auto threads = [&] {
+        return std::distance(std::filesystem::directory_iterator(tasks),
+                             std::filesystem::directory_iterator());
+    };
+    const auto before = threads();
+    const QImage image = Paint(3, "Verification Results", 897, 520);
+    EXPECT_EQ(threads(), before);
+    ExpectNear(image.pixel(1, 300), Solid(), "left side, halfway down");
+    ExpectNear(image.pixel(895, 300), Solid(), "right side, halfway down");
+    EXPECT_EQ(image.pixel(0, 519), kGround) << "rounded bottom corner";
 }
 
 }  // namespace
