@@ -8,33 +8,27 @@
 
 namespace {
 
-// The first of `names` that this desktop has, or the first name if it has none of them.
-QString FirstInstalled(const QStringList& names) {
-    const QStringList families = QFontDatabase::families();
-    for (const QString& name : names) {
+// Most Linux desktops have no Arial. Fontconfig gives its metric twin in its place, but Qt
+// asks for it only after sorting every installed font into a fallback list, which costs a
+// start-up about a millisecond. The twin asked for by name is the same face, found at once.
+QString InstalledFamily(const std::string& family) {
+    const QString name = QString::fromStdString(family);
+    if (!TextEquals(family, "Arial")) {
+        return name;
+    }
+    static const QString installed = [&name] {
+        const QStringList families = QFontDatabase::families();
         if (families.contains(name, Qt::CaseInsensitive)) {
             return name;
         }
-    }
-    return names.first();
-}
-
-// Most Linux desktops have neither Arial nor Courier. Fontconfig gives their metric twins in
-// their place, but Qt asks for a twin only after sorting every installed font into a fallback
-// list, which costs a start-up about a millisecond, and with the typewriter hint it may settle
-// on another monospaced face, whose wider letters would reflow the report's columns. The twin
-// asked for by name is the face that fontconfig means, found at once.
-QString InstalledFamily(const std::string& family) {
-    if (TextEquals(family, "Arial")) {
-        static const QString arial = FirstInstalled({"Arial", "Liberation Sans", "Arimo"});
-        return arial;
-    }
-    if (TextEquals(family, "Courier")) {
-        static const QString courier =
-            FirstInstalled({"Courier", "Courier New", "Liberation Mono", "Cousine"});
-        return courier;
-    }
-    return QString::fromStdString(family);
+        for (const char* twin : {"Liberation Sans", "Arimo"}) {
+            if (families.contains(twin, Qt::CaseInsensitive)) {
+                return QString(twin);
+            }
+        }
+        return name;
+    }();
+    return installed;
 }
 
 }  // namespace
@@ -44,5 +38,10 @@ void SetFontFamily(QFont& font, const std::string& family) {
         return;
     }
     font.setFamily(InstalledFamily(family));
-    font.setStyleHint(family == "Courier" ? QFont::TypeWriter : QFont::SansSerif);
+    // Fontconfig knows Courier's stand-ins by its name alone, and falls back to a monospaced
+    // face after them; a typewriter hint would put the desktop's monospaced face first, whose
+    // wider letters reflow the report's columns.
+    if (!TextEquals(family, "Courier")) {
+        font.setStyleHint(QFont::SansSerif);
+    }
 }
