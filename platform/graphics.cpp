@@ -16,6 +16,12 @@ namespace {
 bool IsWhole(double value) {
     return std::floor(value) == value;
 }
+
+// Whether whole numbers land on whole device pixels: no rotation, whole scales and shifts.
+bool KeepsWholePixels(const QTransform& transform) {
+    return transform.type() <= QTransform::TxScale && IsWhole(transform.m11()) &&
+           IsWhole(transform.m22()) && IsWhole(transform.dx()) && IsWhole(transform.dy());
+}
 }  // namespace
 
 Graphics::Graphics(QPainter& painter, int width, int height, Color ground)
@@ -61,7 +67,7 @@ void Graphics::DrawRoundRect(double x, double y, double width, double height, do
     // pixels without going through the blend of many spans (see FillRows).
     const double corner = std::ceil(std::max(std::min(arcHeight / 2, height / 2), ph));
     if (IsWhole(x) && IsWhole(y) && IsWhole(width) && IsWhole(height) && IsWhole(pw) &&
-        2 * corner < height) {
+        2 * corner < height && KeepsWholePixels(painter_.deviceTransform())) {
         painter_.save();
         const QRegion corners = QRegion(QRectF(x, y, width, corner).toRect()) +
                                 QRect(QRectF(x, y + height - corner, width, corner).toRect());
