@@ -123,7 +123,8 @@ const Ref<DatabaseField>& RecordSet::Field(std::string_view name) const {
         asked_.emplace_back(name, column);
     }
     // The column's value is asked for once, rather than once for its text and once for its
-    // length: the connection is this thread's alone, so the value needs no lock around it.
+    // length. SQLite hands it out unprotected, which only matters to another thread, and the
+    // connection is this thread's alone.
     sqlite3_value* value = sqlite3_column_value(statement_, column);
     const auto* text = reinterpret_cast<const char*>(sqlite3_value_text(value));
     const auto bytes = text ? static_cast<size_t>(sqlite3_value_bytes(value)) : 0;

@@ -66,8 +66,9 @@ void Graphics::DrawRoundRect(double x, double y, double width, double height, do
     // is a column of fully covered pixels: filled as rectangles, the tall sides give the same
     // pixels without going through the blend of many spans (see FillRows).
     const double corner = std::ceil(std::max(std::min(arcHeight / 2, height / 2), ph));
-    if (IsWhole(x) && IsWhole(y) && IsWhole(width) && IsWhole(height) && IsWhole(pw) &&
-        2 * corner < height && KeepsWholePixels(painter_.deviceTransform())) {
+    if (width > 0 && pw >= 0 && ph >= 0 && IsWhole(x) && IsWhole(y) && IsWhole(width) &&
+        IsWhole(height) && IsWhole(pw) && 2 * corner < height &&
+        KeepsWholePixels(painter_.deviceTransform())) {
         painter_.save();
         const QRegion corners = QRegion(QRectF(x, y, width, corner).toRect()) +
                                 QRect(QRectF(x, y + height - corner, width, corner).toRect());
@@ -88,14 +89,18 @@ void Graphics::DrawRoundRect(double x, double y, double width, double height, do
 // start and several hand-offs in a single paint, slower than blending on this thread. An opaque
 // rectangle is a plain fill and needs no such care.
 void Graphics::FillRows(const QRectF& area, const QColor& color) {
-    if (color.alpha() == 255) {
+    const QTransform& device = painter_.deviceTransform();
+    if (color.alpha() == 255 || !IsWhole(area.top()) || !IsWhole(area.height()) ||
+        !KeepsWholePixels(device)) {
         painter_.fillRect(area, color);
         return;
     }
-    for (double top = area.top(); top < area.bottom(); top += kBlendRows) {
+    // The limit is on device rows: on a screen of two pixels a point, half as many points.
+    const double scale = std::abs(device.m22());
+    const double rows = scale > 0 ? std::max(1.0, std::floor(kBlendRows / scale)) : kBlendRows;
+    for (double top = area.top(); top < area.bottom(); top += rows) {
         painter_.fillRect(
-            QRectF(area.left(), top, area.width(), std::min(kBlendRows, area.bottom() - top)),
-            color);
+            QRectF(area.left(), top, area.width(), std::min(rows, area.bottom() - top)), color);
     }
 }
 

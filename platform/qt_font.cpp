@@ -39,8 +39,8 @@ void SetFontFamily(QFont& font, const std::string& family) {
     }
     font.setFamily(InstalledFamily(family));
     // Fontconfig knows Courier's stand-ins by its name alone, and falls back to a monospaced
-    // face after them; a typewriter hint would put the desktop's monospaced face first, whose
-    // wider letters reflow the report's columns.
+    // face after them; with a typewriter hint, Qt may take the desktop's monospaced face
+    // before them, whose wider letters reflow the report's columns.
     if (!TextEquals(family, "Courier")) {
         font.setStyleHint(QFont::SansSerif);
     }
