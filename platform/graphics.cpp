@@ -69,12 +69,19 @@ void Graphics::DrawRoundRect(double x, double y, double width, double height, do
     if (width > 0 && pw >= 0 && ph >= 0 && IsWhole(x) && IsWhole(y) && IsWhole(width) &&
         IsWhole(height) && IsWhole(pw) && 2 * corner < height &&
         KeepsWholePixels(painter_.deviceTransform())) {
-        painter_.save();
-        const QRegion corners = QRegion(QRectF(x, y, width, corner).toRect()) +
-                                QRect(QRectF(x, y + height - corner, width, corner).toRect());
-        painter_.setClipRegion(corners, Qt::IntersectClip);
-        painter_.fillPath(ring, color);
-        painter_.restore();
+        // The corners' rows go a few device rows at a time, top and bottom together, so that
+        // each blend stays under the limit on a screen of two pixels a point too.
+        const double scale = std::abs(painter_.deviceTransform().m22());
+        const double step = std::max(1.0, std::floor(kCornerRows / scale));
+        for (double row = 0; row < corner; row += step) {
+            const double rows = std::min(step, corner - row);
+            painter_.save();
+            const QRegion band = QRegion(QRectF(x, y + row, width, rows).toRect()) +
+                                 QRect(QRectF(x, y + height - corner + row, width, rows).toRect());
+            painter_.setClipRegion(band, Qt::IntersectClip);
+            painter_.fillPath(ring, color);
+            painter_.restore();
+        }
         painter_.setRenderHint(QPainter::Antialiasing, false);
         FillRows(QRectF(x, y + corner, pw, height - 2 * corner), color);
         FillRows(QRectF(x + width - pw, y + corner, pw, height - 2 * corner), color);

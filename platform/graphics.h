@@ -38,7 +38,8 @@ class Graphics {
                     bool condense = false);
 
   private:
-    static constexpr double kBlendRows = 64;
+    static constexpr double kBlendRows = 64;  // device rows of a rectangle in one blend
+    static constexpr double kCornerRows = 7;  // device rows of a ring's corners in one blend
     void FillRows(const QRectF& area, const QColor& color);
 
     QPainter& painter_;

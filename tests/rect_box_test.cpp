@@ -19,8 +19,10 @@ constexpr int H = 120;
 constexpr Color kColour = 0x225684;
 const QRgb kGround = qRgb(255, 255, 255);
 
-QImage Paint(long long linesize, const std::string& title, int width = W, int height = H) {
-    QImage image(width, height, QImage::Format_ARGB32);
+QImage Paint(long long linesize, const std::string& title, int width = W, int height = H,
+             int ratio = 1) {
+    QImage image(width * ratio, height * ratio, QImage::Format_ARGB32);
+    image.setDevicePixelRatio(ratio);
     image.fill(kGround);
     RectBox box;
     box.colour = kColour;
@@ -114,6 +116,8 @@ TEST(RectBox, PageSizedFramePaintsOnTheCallingThreadAlone) {
     const auto before = threads();
     const QImage image = Paint(3, "Verification Results", 897, 520);
     EXPECT_EQ(threads(), before);
+    Paint(3, "Verification Results", 897, 520, 2);
+    EXPECT_EQ(threads(), before) << "on a screen of two pixels a point";
     ExpectNear(image.pixel(1, 300), Solid(), "left side, halfway down");
     ExpectNear(image.pixel(895, 300), Solid(), "right side, halfway down");
     EXPECT_EQ(image.pixel(0, 516), kGround) << "rounded bottom corner";
