@@ -219,16 +219,10 @@ void MeasureStore(const fs::path& folder, const Shape& shape, int runs) {
     const double average = static_cast<double>(fs::file_size(store)) / shape.count;
     std::printf("%zu results, %s (%.0f bytes a row on file), median of %d:\n", shape.count,
                 shape.name, average, runs);
-    // Each load is followed by its floor: the median of their ratios is the steadier figure
-    // when the machine's speed drifts during the run.
-    std::vector<double> paired;
-    for (size_t i = 0; i < loads.size(); ++i) {
-        paired.push_back(loads[i] / floors[i]);
-    }
     std::printf(
         "  list load %.0f ms, floor %.0f ms: ratio %.2f, median of the paired ratios "
         "%.2f%s\n",
-        l, f, l / f, Median(paired), million ? " (target <= 1.5)" : "");
+        l, f, l / f, MedianOfRatios(loads, floors), million ? " (target <= 1.5)" : "");
     std::printf("  sqlite3 CLI %.0f ms: ratio %.2f\n", c, l / c);
     std::printf("  rows reach the view %.1f ms after the loop%s\n", Median(flushes),
                 million ? " (target <= 50 ms)" : "");

@@ -14,6 +14,16 @@ inline double Median(std::vector<double> values) {
     return values[values.size() / 2];
 }
 
+// The median of first[i] / second[i]: runs made in the same round share the machine's speed of
+// the moment, so this holds steadier than the ratio of two medians when that speed drifts.
+inline double MedianOfRatios(const std::vector<double>& first, const std::vector<double>& second) {
+    std::vector<double> ratios;
+    for (size_t i = 0; i < first.size() && i < second.size(); ++i) {
+        ratios.push_back(first[i] / second[i]);
+    }
+    return Median(ratios);
+}
+
 template <class F>
 double Milliseconds(F&& work) {
     const auto start = std::chrono::steady_clock::now();

@@ -69,10 +69,8 @@ void Graphics::DrawRoundRect(double x, double y, double width, double height, do
     if (width > 0 && pw >= 0 && ph >= 0 && IsWhole(x) && IsWhole(y) && IsWhole(width) &&
         IsWhole(height) && IsWhole(pw) && 2 * corner < height &&
         KeepsWholePixels(painter_.deviceTransform())) {
-        // The corners' rows go a few device rows at a time, top and bottom together, so that
-        // each blend stays under the limit on a screen of two pixels a point too.
-        const double scale = std::abs(painter_.deviceTransform().m22());
-        const double step = std::max(1.0, std::floor(kCornerRows / scale));
+        // The corners' rows go a few device rows at a time, top and bottom together.
+        const double step = RowsOnDevice(kCornerRows);
         for (double row = 0; row < corner; row += step) {
             const double rows = std::min(step, corner - row);
             painter_.save();
@@ -96,19 +94,23 @@ void Graphics::DrawRoundRect(double x, double y, double width, double height, do
 // start and several hand-offs in a single paint, slower than blending on this thread. An opaque
 // rectangle is a plain fill and needs no such care.
 void Graphics::FillRows(const QRectF& area, const QColor& color) {
-    const QTransform& device = painter_.deviceTransform();
     if (color.alpha() == 255 || !IsWhole(area.top()) || !IsWhole(area.height()) ||
-        !KeepsWholePixels(device)) {
+        !KeepsWholePixels(painter_.deviceTransform())) {
         painter_.fillRect(area, color);
         return;
     }
-    // The limit is on device rows: on a screen of two pixels a point, half as many points.
-    const double scale = std::abs(device.m22());
-    const double rows = scale > 0 ? std::max(1.0, std::floor(kBlendRows / scale)) : kBlendRows;
+    const double rows = RowsOnDevice(kBlendRows);
     for (double top = area.top(); top < area.bottom(); top += rows) {
         painter_.fillRect(
             QRectF(area.left(), top, area.width(), std::min(rows, area.bottom() - top)), color);
     }
+}
+
+// The rows of this surface that make `deviceRows` rows on the device, at least one: the limit
+// is on device rows, so on a screen of two pixels a point it is half as many.
+double Graphics::RowsOnDevice(double deviceRows) const {
+    const double scale = std::abs(painter_.deviceTransform().m22());
+    return scale > 0 ? std::max(1.0, std::floor(deviceRows / scale)) : deviceRows;
 }
 
 void Graphics::DrawLine(double x1, double y1, double x2, double y2) {

@@ -41,6 +41,7 @@ class Graphics {
     static constexpr double kBlendRows = 64;  // device rows of a rectangle in one blend
     static constexpr double kCornerRows = 7;  // device rows of a ring's corners in one blend
     void FillRows(const QRectF& area, const QColor& color);
+    double RowsOnDevice(double deviceRows) const;
 
     QPainter& painter_;
     int width_;
