@@ -2,6 +2,7 @@
 #include "platform/runtime.h"
 
 #include <QApplication>
+#include <QFont>
 #include <QPointer>
 #include <QTimer>
 #include <QWidget>
@@ -136,6 +137,11 @@ void RuntimeInit(int argc, char** argv) {
     argcKept = 1;
     ownApplication = std::make_unique<QApplication>(argcKept, argvKept);
     QApplication::setStyle(new ApplicationStyle);
+    // Text keeps its designed shapes, unhinted, as macOS draws it. Hinting would also set
+    // FreeType's hinter up for every face and size at start-up, and load each glyph through it.
+    QFont font = QApplication::font();
+    font.setHintingPreference(QFont::PreferNoHinting);
+    QApplication::setFont(font);
     // The desktop ties the window to the installed desktop entry, and so to its icon, by this
     // name; the entry is named after the executable.
     QGuiApplication::setDesktopFileName(QCoreApplication::applicationName());
