@@ -8,6 +8,8 @@
 
 #include <algorithm>
 #include <cmath>
+#include <optional>
+#include <vector>
 
 #include "platform/qt_color.h"
 #include "platform/qt_font.h"
@@ -21,6 +23,92 @@ bool IsWhole(double value) {
 bool KeepsWholePixels(const QTransform& transform) {
     return transform.type() <= QTransform::TxScale && IsWhole(transform.m11()) &&
            IsWhole(transform.m22()) && IsWhole(transform.dx()) && IsWhole(transform.dy());
+}
+
+// The part of a closed outline between the rows `top` and `bottom`, closed along them. In
+// those rows it has the same edges as the whole outline, so it covers the same pixels there,
+// and the rasteriser walks only those rows, where the whole outline would cost as many as it
+// is tall. Only a vertical line may cross `top` or `bottom`; for any other outline there is
+// no such part. Points closer than the rasteriser's grain to a row count as on it.
+std::optional<QPainterPath> RowsOf(const QPainterPath& outline, double top, double bottom) {
+    constexpr double kGrain = 1.0 / 256;
+    const auto near = [](double a, double b) { return std::abs(a - b) <= kGrain; };
+    QPainterPath part;
+    part.setFillRule(outline.fillRule());
+    bool open = false;
+    QPointF first, current;
+    // Pieces join along the edge of the rows, where a line has no height in them.
+    const auto joins = [&](QPointF to) {
+        return current == to ||
+               (near(current.y(), to.y()) && (near(to.y(), top) || near(to.y(), bottom)));
+    };
+    const auto close = [&] {
+        if (!open) {
+            return true;
+        }
+        open = false;
+        if (!joins(first)) {
+            return false;
+        }
+        part.lineTo(first);
+        part.closeSubpath();
+        return true;
+    };
+    QPointF start;
+    for (int i = 0; i < outline.elementCount(); ++i) {
+        const QPainterPath::Element e = outline.elementAt(i);
+        if (e.isMoveTo()) {
+            if (!close()) {
+                return std::nullopt;
+            }
+            start = e;
+            continue;
+        }
+        std::vector<QPointF> points{start, e};
+        if (e.isCurveTo()) {
+            if (i + 2 >= outline.elementCount()) {
+                return std::nullopt;
+            }
+            points.insert(points.end(), {outline.elementAt(i + 1), outline.elementAt(i + 2)});
+            i += 2;
+        }
+        const auto [low, high] = std::minmax_element(
+            points.begin(), points.end(), [](QPointF a, QPointF b) { return a.y() < b.y(); });
+        const double lowest = low->y();
+        const double highest = high->y();
+        QPointF from = points.front();
+        QPointF to = points.back();
+        start = to;
+        if (highest <= top + kGrain || lowest >= bottom - kGrain) {
+            continue;  // nothing of it in the rows
+        }
+        if (lowest < top - kGrain || highest > bottom + kGrain) {
+            if (points.size() != 2 || from.x() != to.x()) {
+                return std::nullopt;
+            }
+            from.setY(std::clamp(from.y(), top, bottom));
+            to.setY(std::clamp(to.y(), top, bottom));
+        }
+        if (!open) {
+            part.moveTo(from);
+            first = current = from;
+            open = true;
+        } else if (!joins(from)) {
+            return std::nullopt;
+        } else if (current != from) {
+            part.lineTo(from);
+        }
+        if (points.size() == 4) {
+            part.cubicTo(points[1], points[2], to);
+        } else {
+            part.lineTo(to);
+        }
+        current = to;
+    }
+    if (!close()) {
+        return std::nullopt;
+    }
+    return part;
 }
 }  // namespace
 
@@ -69,16 +157,18 @@ void Graphics::DrawRoundRect(double x, double y, double width, double height, do
     if (width > 0 && pw >= 0 && ph >= 0 && IsWhole(x) && IsWhole(y) && IsWhole(width) &&
         IsWhole(height) && IsWhole(pw) && 2 * corner < height &&
         KeepsWholePixels(painter_.deviceTransform())) {
-        // The corners' rows go a few device rows at a time, top and bottom together.
+        // Each band of corners is filled from its own rows of the ring, a few device rows at
+        // a time.
         const double step = RowsOnDevice(kCornerRows);
-        for (double row = 0; row < corner; row += step) {
-            const double rows = std::min(step, corner - row);
-            painter_.save();
-            const QRegion band = QRegion(QRectF(x, y + row, width, rows).toRect()) +
-                                 QRect(QRectF(x, y + height - corner + row, width, rows).toRect());
-            painter_.setClipRegion(band, Qt::IntersectClip);
-            painter_.fillPath(ring, color);
-            painter_.restore();
+        for (const double top : {y, y + height - corner}) {
+            const auto rows = RowsOf(ring, top, top + corner);
+            for (double row = 0; row < corner; row += step) {
+                painter_.save();
+                painter_.setClipRect(QRectF(x, top + row, width, std::min(step, corner - row)),
+                                     Qt::IntersectClip);
+                painter_.fillPath(rows ? *rows : ring, color);
+                painter_.restore();
+            }
         }
         painter_.setRenderHint(QPainter::Antialiasing, false);
         FillRows(QRectF(x, y + corner, pw, height - 2 * corner), color);

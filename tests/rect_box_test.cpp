@@ -3,14 +3,17 @@
 // of 20 rows with its hairline on the top row, the sides and row 19.
 #include <QImage>
 #include <QPainter>
+#include <QPainterPath>
 #include <QThreadPool>
 
 #include <gtest/gtest.h>
 
+#include <cmath>
 #include <filesystem>
 #include <iterator>
 
 #include "drawing/rect_box.h"
+#include "platform/graphics.h"
 
 namespace {
 
@@ -124,3 +127,47 @@ TEST(RectBox, PageSizedFramePaintsOnTheCallingThreadAlone) {
 }
 
 }  // namespace
+
+// The frame is filled in pieces: rectangles for its sides, its corners from their own rows.
+// Together they cover exactly the pixels of the whole ring filled at once.
+TEST(RectBox, RoundedFrameInPiecesCoversTheSamePixelsAsTheWholeRing) {
+    struct Case {
+        double x, y, width, height, arc, pen, transparency;
+    };
+    const Case cases[] = {{0, 0, 897, 517, 14, 3, 0},   {0, 0, 897, 517, 14, 1, 75},
+                          {2, 2, 893, 511, 12, 1, 75},  {9, 13, 239, 168, 27, 6, 0},
+                          {0, 0, 40, 30, 14, 3, 30},    {4, 0, 55, 29, 10, 5, 0},
+                          {0, 0, 300, 200, 100, 10, 20}};
+    for (const int ratio : {1, 2}) {
+        for (const Case& c : cases) {
+            QImage pieces(920 * ratio, 540 * ratio, QImage::Format_ARGB32_Premultiplied);
+            pieces.setDevicePixelRatio(ratio);
+            pieces.fill(kGround);
+            QImage whole = pieces;
+            {
+                QPainter painter(&pieces);
+                Graphics g(painter, 920, 540, 0xFFFFFF);
+                g.ForeColor = kColour;
+                g.PenWidth = g.PenHeight = c.pen;
+                g.Transparency = c.transparency;
+                g.DrawRoundRect(c.x, c.y, c.width, c.height, c.arc, c.arc);
+            }
+            {
+                QPainterPath ring;
+                ring.setFillRule(Qt::OddEvenFill);
+                ring.addRoundedRect(QRectF(c.x, c.y, c.width, c.height), c.arc / 2, c.arc / 2);
+                ring.addRoundedRect(
+                    QRectF(c.x + c.pen, c.y + c.pen, c.width - 2 * c.pen, c.height - 2 * c.pen),
+                    std::max(0.0, c.arc / 2 - c.pen), std::max(0.0, c.arc / 2 - c.pen));
+                QPainter painter(&whole);
+                painter.setRenderHint(QPainter::Antialiasing);
+                const QColor colour(
+                    Red(kColour), Green(kColour), Blue(kColour),
+                    static_cast<int>(std::lround(255 * (1 - c.transparency / 100))));
+                painter.fillPath(ring, colour);
+            }
+            EXPECT_TRUE(pieces == whole) << c.width << "x" << c.height << " arc " << c.arc
+                                         << " pen " << c.pen << " at ratio " << ratio;
+        }
+    }
+}
