@@ -12,6 +12,9 @@
 
 namespace {
 
+// What Field hands out for no column: a reference to it lives as long as the program.
+const Ref<DatabaseField> kNil;
+
 bool IsBlankTail(sqlite3* db, const char* tail) {
     // Only blanks and comments may follow: a second statement makes the text fail.
     while (tail && *tail) {
@@ -64,13 +67,6 @@ bool IsWalWithoutLog(const std::filesystem::path& file) {
 
 }  // namespace
 
-void DatabaseField::Refer(const char* text, size_t bytes) {
-    if (!kept_.empty()) {
-        kept_ = std::string();  // a huge text kept before goes back to the system
-    }
-    value_ = std::string_view(text, bytes);
-}
-
 void DatabaseField::Keep() {
     if (value_.data() != kept_.data()) {
         kept_.assign(value_);
@@ -93,7 +89,6 @@ RecordSet::~RecordSet() {
 }
 
 const Ref<DatabaseField>& RecordSet::Field(std::string_view name) const {
-    static const Ref<DatabaseField> kNil;
     if (!statement_ || atEnd_) {
         return kNil;
     }
