@@ -7,9 +7,9 @@
 #include <QRegion>
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 #include <optional>
-#include <vector>
 
 #include "platform/qt_color.h"
 #include "platform/qt_font.h"
@@ -64,26 +64,29 @@ std::optional<QPainterPath> RowsOf(const QPainterPath& outline, double top, doub
             start = e;
             continue;
         }
-        std::vector<QPointF> points{start, e};
+        std::array<QPointF, 4> points{start, e};
+        size_t count = 2;
         if (e.isCurveTo()) {
             if (i + 2 >= outline.elementCount()) {
                 return std::nullopt;
             }
-            points.insert(points.end(), {outline.elementAt(i + 1), outline.elementAt(i + 2)});
-            i += 2;
+            points[2] = outline.elementAt(++i);
+            points[3] = outline.elementAt(++i);
+            count = 4;
         }
-        const auto [low, high] = std::minmax_element(
-            points.begin(), points.end(), [](QPointF a, QPointF b) { return a.y() < b.y(); });
+        const auto [low, high] =
+            std::minmax_element(points.begin(), points.begin() + count,
+                                [](QPointF a, QPointF b) { return a.y() < b.y(); });
         const double lowest = low->y();
         const double highest = high->y();
-        QPointF from = points.front();
-        QPointF to = points.back();
+        QPointF from = points[0];
+        QPointF to = points[count - 1];
         start = to;
         if (highest <= top + kGrain || lowest >= bottom - kGrain) {
             continue;  // nothing of it in the rows
         }
         if (lowest < top - kGrain || highest > bottom + kGrain) {
-            if (points.size() != 2 || from.x() != to.x()) {
+            if (count != 2 || from.x() != to.x()) {
                 return std::nullopt;
             }
             from.setY(std::clamp(from.y(), top, bottom));
@@ -98,7 +101,7 @@ std::optional<QPainterPath> RowsOf(const QPainterPath& outline, double top, doub
         } else if (current != from) {
             part.lineTo(from);
         }
-        if (points.size() == 4) {
+        if (count == 4) {
             part.cubicTo(points[1], points[2], to);
         } else {
             part.lineTo(to);
