@@ -12,8 +12,9 @@
 
 namespace {
 
-// What Field hands out for no column: a reference to it lives as long as the program.
-const Ref<DatabaseField> kNil;
+// What Field hands out for no such column, or no current row: a reference to it stays valid
+// until the program ends.
+constinit const Ref<DatabaseField> kNil;
 
 bool IsBlankTail(sqlite3* db, const char* tail) {
     // Only blanks and comments may follow: a second statement makes the text fail.
@@ -66,6 +67,13 @@ bool IsWalWithoutLog(const std::filesystem::path& file) {
 }
 
 }  // namespace
+
+void DatabaseField::Refer(const char* text, size_t bytes) {
+    if (!kept_.empty()) {
+        kept_ = std::string();  // a huge text kept before goes back to the system
+    }
+    value_ = std::string_view(text, bytes);
+}
 
 void DatabaseField::Keep() {
     if (value_.data() != kept_.data()) {

@@ -28,12 +28,7 @@ class DatabaseField {
     // Platform use. A field that nobody else holds is only a view of the current row's text,
     // so a loop over a million rows copies none of it; a held field keeps its own copy before
     // the row goes.
-    void Refer(const char* text, size_t bytes) {
-        if (!kept_.empty()) {
-            kept_ = std::string();  // a huge text kept before goes back to the system
-        }
-        value_ = std::string_view(text, bytes);
-    }
+    void Refer(const char* text, size_t bytes);
     void Keep();
 
   private:

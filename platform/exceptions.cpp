@@ -20,4 +20,3 @@ void _UnhandledException(const RuntimeException& exception) {
     std::fprintf(stderr, "Unhandled %s\n", exception.ClassName().c_str());
     std::fflush(stderr);
 }
-

@@ -4,7 +4,6 @@
 #include <QFont>
 #include <QPainter>
 #include <QPainterPath>
-#include <QRegion>
 
 #include <algorithm>
 #include <array>
@@ -29,10 +28,11 @@ bool KeepsWholePixels(const QTransform& transform) {
 // those rows it has the same edges as the whole outline, so it covers the same pixels there,
 // and the rasteriser walks only those rows, where the whole outline would cost as many as it
 // is tall. Only a vertical line may cross `top` or `bottom`; for any other outline there is
-// no such part. Points closer than the rasteriser's grain to a row count as on it.
+// no such part. A point within kGrain of a row counts as on it: far less than the 1/64 of a
+// device pixel that the rasteriser rounds points to, it only absorbs rounding errors.
 std::optional<QPainterPath> RowsOf(const QPainterPath& outline, double top, double bottom) {
-    constexpr double kGrain = 1.0 / 256;
-    const auto near = [](double a, double b) { return std::abs(a - b) <= kGrain; };
+    constexpr double kGrain = 1.0 / 1024;
+    const auto same = [](double a, double b) { return std::abs(a - b) <= kGrain; };
     QPainterPath part;
     part.setFillRule(outline.fillRule());
     bool open = false;
@@ -40,9 +40,9 @@ std::optional<QPainterPath> RowsOf(const QPainterPath& outline, double top, doub
     // Pieces join along the edge of the rows, where a line has no height in them.
     const auto joins = [&](QPointF to) {
         return current == to ||
-               (near(current.y(), to.y()) && (near(to.y(), top) || near(to.y(), bottom)));
+               (same(current.y(), to.y()) && (same(to.y(), top) || same(to.y(), bottom)));
     };
-    const auto close = [&] {
+    const auto closePart = [&] {
         if (!open) {
             return true;
         }
@@ -58,14 +58,14 @@ std::optional<QPainterPath> RowsOf(const QPainterPath& outline, double top, doub
     for (int i = 0; i < outline.elementCount(); ++i) {
         const QPainterPath::Element e = outline.elementAt(i);
         if (e.isMoveTo()) {
-            if (!close()) {
+            if (!closePart()) {
                 return std::nullopt;
             }
             start = e;
             continue;
         }
         std::array<QPointF, 4> points{start, e};
-        size_t count = 2;
+        std::size_t count = 2;
         if (e.isCurveTo()) {
             if (i + 2 >= outline.elementCount()) {
                 return std::nullopt;
@@ -108,7 +108,7 @@ std::optional<QPainterPath> RowsOf(const QPainterPath& outline, double top, doub
         }
         current = to;
     }
-    if (!close()) {
+    if (!closePart()) {
         return std::nullopt;
     }
     return part;
@@ -164,12 +164,12 @@ void Graphics::DrawRoundRect(double x, double y, double width, double height, do
         // a time.
         const double step = RowsOnDevice(kCornerRows);
         for (const double top : {y, y + height - corner}) {
-            const auto rows = RowsOf(ring, top, top + corner);
+            const auto band = RowsOf(ring, top, top + corner);
             for (double row = 0; row < corner; row += step) {
                 painter_.save();
                 painter_.setClipRect(QRectF(x, top + row, width, std::min(step, corner - row)),
                                      Qt::IntersectClip);
-                painter_.fillPath(rows ? *rows : ring, color);
+                painter_.fillPath(band ? *band : ring, color);
                 painter_.restore();
             }
         }

@@ -1,6 +1,7 @@
 // Pixels of the titled frame against its arithmetic: the frame L pixels thick inside
 // (0, 0, W, H - L), hairlines of quarter-strength black on its outer and inner edges, the band
-// of 20 rows with its hairline on the top row, the sides and row 19.
+// of 20 rows with its hairline on the top row, the sides and row 19. And the rounded frame,
+// painted in pieces, against the whole ring.
 #include <QImage>
 #include <QPainter>
 #include <QPainterPath>
@@ -8,6 +9,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cmath>
 #include <filesystem>
 #include <iterator>
@@ -126,8 +128,6 @@ TEST(RectBox, PageSizedFramePaintsOnTheCallingThreadAlone) {
     EXPECT_EQ(image.pixel(0, 516), kGround) << "rounded bottom corner";
 }
 
-}  // namespace
-
 // The frame is filled in pieces: rectangles for its sides, its corners from their own rows.
 // Together they cover exactly the pixels of the whole ring filled at once.
 TEST(RectBox, RoundedFrameInPiecesCoversTheSamePixelsAsTheWholeRing) {
@@ -171,3 +171,5 @@ TEST(RectBox, RoundedFrameInPiecesCoversTheSamePixelsAsTheWholeRing) {
         }
     }
 }
+
+}  // namespace
