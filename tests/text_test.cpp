@@ -72,13 +72,6 @@ TEST(Text, InStrAgreesWithAPlainScanOnRandomTexts) {
     }
 }
 
-TEST(Text, LeftTakesCharacters) {
-    EXPECT_EQ(Left(".DS_Store", 1), ".");
-    EXPECT_EQ(Left("\xC3\xA9t\xC3\xA9", 1), "\xC3\xA9");
-    EXPECT_EQ(Left("abc", 10), "abc");
-    EXPECT_EQ(Left("abc", -1), "");
-}
-
 TEST(Text, TrimTakesWhiteSpaceOffBothEndsOnly) {
     EXPECT_EQ(Trim(" \r\n\tBar 1\r Bar 2 \r\n"), "Bar 1\r Bar 2");
     EXPECT_EQ(Trim(" \r\n\t "), "");
@@ -103,17 +96,6 @@ TEST(Text, Int64FromDoubleCutsTowardsZeroAndSaturates) {
     EXPECT_EQ(Int64FromDouble(-22.9), -22);
     EXPECT_EQ(Int64FromDouble(-1e300), std::numeric_limits<long long>::min());
     EXPECT_EQ(Int64FromDouble(std::numeric_limits<double>::quiet_NaN()), 0);
-}
-
-TEST(Text, StrChrAndComparison) {
-    EXPECT_EQ(Chr(0xE9), "\xC3\xA9");
-    EXPECT_EQ(Chr(-5), "");
-    EXPECT_TRUE(TextEquals("Illustrator CC", "illustrator cc"));
-    EXPECT_FALSE(TextEquals("Acrobat XI", "Acrobat X"));
-    EXPECT_NE(RuntimeStringCompare("a", ""), 0);
-    EXPECT_TRUE(TextEquals("\xC3\x89", "\xC3\xA9")) << "folding beyond ASCII";
-    EXPECT_FALSE(TextEquals("\xF8\x80\x80", "\xE8\x80\x80"))
-        << "invalid bytes stand for themselves";
 }
 
 }  // namespace
