@@ -13,7 +13,7 @@
 #include <string>
 #include <vector>
 
-#include "platform/runtime.h"
+#include "platform/runtime/runtime.h"
 #include "scripts/demo_tree.h"
 #include "shell/startup.h"
 #include "shell/window1.h"

@@ -26,8 +26,8 @@
 #include <vector>
 
 #include "installer/copy.h"
-#include "platform/runtime.h"
-#include "platform/yield.h"
+#include "platform/runtime/runtime.h"
+#include "platform/runtime/yield.h"
 #include "scripts/demo_tree.h"
 #include "shell/startup.h"
 #include "shell/window1.h"

@@ -8,7 +8,7 @@
 
 #include <cstdlib>
 
-#include "platform/runtime.h"
+#include "platform/runtime/runtime.h"
 #include "shell/startup.h"
 #include "shell/window1.h"
 

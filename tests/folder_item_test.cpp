@@ -2,7 +2,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include "platform/folder_item.h"
+#include "platform/core/folder_item.h"
 #include "support.h"
 
 using namespace testsupport;

@@ -7,7 +7,7 @@
 #include <chrono>
 #include <future>
 
-#include "platform/database.h"
+#include "platform/core/database.h"
 #include "window_fixture.h"
 
 using namespace testsupport;

@@ -3,7 +3,7 @@
 #include <QLabel>
 #include <QPlainTextEdit>
 
-#include "platform/shown_text.h"
+#include "platform/widgets/shown_text.h"
 #include "window_fixture.h"
 
 using namespace testsupport;

@@ -9,8 +9,8 @@
 #include <QPlainTextEdit>
 #include <QStyle>
 
-#include "platform/application_style.h"
-#include "platform/runtime.h"
+#include "platform/runtime/application_style.h"
+#include "platform/runtime/runtime.h"
 #include "shell/main_menu_bar.h"
 #include "shell/startup.h"
 #include "shell/window1.h"

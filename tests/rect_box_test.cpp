@@ -15,7 +15,7 @@
 #include <iterator>
 
 #include "drawing/rect_box.h"
-#include "platform/graphics.h"
+#include "platform/widgets/graphics.h"
 
 namespace {
 

@@ -6,7 +6,7 @@
 #include <optional>
 #include <random>
 
-#include "platform/text.h"
+#include "platform/core/text.h"
 
 namespace {
 

@@ -1,7 +1,7 @@
 // The resources rule on each layout the program ships in, built in a temporary folder.
-#include "platform/resources_folder.h"
+#include "platform/core/resources_folder.h"
 
-#include "platform/folder_item.h"
+#include "platform/core/folder_item.h"
 #include "support.h"
 
 using namespace testsupport;

@@ -7,8 +7,8 @@
 #include <string>
 #include <vector>
 
-#include "platform/row_store.h"
-#include "platform/text.h"
+#include "platform/core/row_store.h"
+#include "platform/core/text.h"
 
 namespace {
 

@@ -2,7 +2,7 @@
 #include <QMainWindow>
 #include <QPushButton>
 
-#include "platform/runtime.h"
+#include "platform/runtime/runtime.h"
 #include "window_fixture.h"
 
 using namespace testsupport;

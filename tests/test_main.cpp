@@ -3,7 +3,7 @@
 
 #include <gtest/gtest.h>
 
-#include "platform/runtime.h"
+#include "platform/runtime/runtime.h"
 
 int main(int argc, char** argv) {
     if (qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM")) {

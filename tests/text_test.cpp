@@ -1,5 +1,5 @@
 // Text field operations: whole-text separators, no regard to case, positions in characters.
-#include "platform/text.h"
+#include "platform/core/text.h"
 
 #include <gtest/gtest.h>
 
