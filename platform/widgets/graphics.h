@@ -6,9 +6,7 @@
 
 #include "platform/core/color.h"
 
-class QColor;
 class QPainter;
-class QRectF;
 
 class Graphics {
   public:
@@ -38,11 +36,6 @@ class Graphics {
                     bool condense = false);
 
   private:
-    static constexpr double kBlendRows = 64;  // device rows of a rectangle in one blend
-    static constexpr double kCornerRows = 7;  // device rows of a ring's corners in one blend
-    void FillRows(const QRectF& area, const QColor& color);
-    double RowsOnDevice(double deviceRows) const;
-
     QPainter& painter_;
     int width_;
     int height_;
