@@ -48,7 +48,7 @@ TEST_F(ShellTest, MainPaintsTheEmptyListFirstAndNeverTheInstallationPage) {
             }
             if (auto window = Cast<class Window1>(_GetImplicitWindow("Window1.Window1"))) {
                 auto* list = static_cast<QTableView*>(window->Listbox1()->Widget());
-                installPage += watched == window->PushButton1()->BuiltWidget() ? 1 : 0;
+                installPage += watched == window->PushButton1()->Widget() ? 1 : 0;
                 listPage += watched == list->viewport() ? 1 : 0;
             }
             return false;

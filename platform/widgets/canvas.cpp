@@ -58,7 +58,7 @@ Canvas::Canvas() {
 }
 
 void Canvas::DetachWidget() {
-    if (auto* widget = static_cast<CanvasWidget*>(BuiltWidget())) {
+    if (auto* widget = static_cast<CanvasWidget*>(Widget())) {
         widget->Forget();
     }
     Control::DetachWidget();

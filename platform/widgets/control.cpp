@@ -66,7 +66,7 @@ void Control::ApplyCommon(const std::string& name, const PropertyValue& value) {
 void Control::PropertiesApplied() {
     for (const char* name : {"TextFont", "TextSize", "Bold", "Italic", "Underline"}) {
         if (Property(name)) {
-            ApplyFont();
+            SetWidgetFont();
             return;
         }
     }
@@ -99,12 +99,6 @@ Ref<Control> Control::Parent() const {
 void Control::AttachTo(const std::shared_ptr<ControlHost>& window) {
     window_ = window;
     if (widget_) {
-        Adopt();
-    }
-}
-
-void Control::Adopt() {
-    if (auto window = window_.lock()) {
         widget_->setParent(window->Client());
         widgetAdopted_ = true;
         Place();
@@ -115,61 +109,12 @@ void Control::SetWidget(QWidget* widget) {
     widget_ = widget;
 }
 
-// Building does not change what the control is: the widget only shows its values.
-QWidget* Control::Widget() const {
-    auto& self = const_cast<Control&>(*this);
-    if (widget_ || detached_) {
-        return widget_;
-    }
-    QWidget* widget = self.BuildWidget();
-    if (!widget) {
-        return nullptr;
-    }
-    self.widget_ = widget;
-    self.Adopt();
-    if (auto window = window_.lock()) {
-        window->Restack(*this);
-    }
-    for (const auto& [name, value] : Properties()) {
-        self.ApplyCommon(name, value);
-        self.Apply(name, value);
-    }
-    self.Control::PropertiesApplied();
-    self.ApplyValues();
-    // Qt shows a child that was never hidden along with its window.
-    widget_->setVisible(IsShown());
-    return widget_;
-}
-
-QWidget* Control::WidgetIfBuilt() const {
-    RequireMainThread();
-    if (detached_) {
-        throw NilObjectException("The control's window is gone");
-    }
-    return widget_;
-}
-
 QWidget& Control::LiveWidget() const {
     RequireMainThread();
-    QWidget* widget = Widget();
-    if (!widget) {
+    if (!widget_) {
         throw NilObjectException("The control's window is gone");
     }
-    return *widget;
-}
-
-void Control::ApplyFont() {
-    fontPending_ = widget_ && !IsShown();
-    if (widget_ && !fontPending_) {
-        SetWidgetFont();
-    }
-}
-
-void Control::ApplyPendingFont() {
-    if (widget_ && fontPending_) {
-        fontPending_ = false;
-        SetWidgetFont();
-    }
+    return *widget_;
 }
 
 // Sizes are pixels, as on the desktop that the window was designed for; 0 is the default.
@@ -182,9 +127,7 @@ void Control::SetWidgetFont() {
     font.setBold(BoolProperty("Bold"));
     font.setItalic(BoolProperty("Italic"));
     font.setUnderline(BoolProperty("Underline"));
-    if (font != widget_->font()) {
-        widget_->setFont(font);
-    }
+    widget_->setFont(font);
 }
 
 void Control::Place() {

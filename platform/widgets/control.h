@@ -18,8 +18,6 @@ class ControlHost {
   public:
     virtual QWidget* Client() const = 0;
     virtual void UpdateVisibility() = 0;
-    // A widget built late goes under the widgets of the controls after it.
-    virtual void Restack(const Control& control) const = 0;
     // Nil when there is no such control.
     virtual const Ref<Control>& _ControlByName(std::string_view name) const = 0;
 
@@ -62,41 +60,21 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     // Return or Enter that no control took: a shown default button presses itself and says so.
     virtual bool PressAsDefault() { return false; }
 
-    // Platform use: the widget, and the window's hand-over when the control is entered. A
-    // control that builds its widget lazily builds it here, at the first ask.
-    QWidget* Widget() const;
-    // The widget if it is built, without building it.
-    QWidget* BuiltWidget() const { return widget_; }
+    // Platform use: the widget, null once the window that showed it is gone, and the
+    // window's hand-over when the control is entered.
+    QWidget* Widget() const { return widget_; }
     // The context of the control's signal connections: they end when the control does.
     QObject* Context() const { return context_.get(); }
     void AttachTo(const std::shared_ptr<ControlHost>& window);
-    virtual void DetachWidget() {
-        widget_ = nullptr;
-        detached_ = true;
-    }
+    virtual void DetachWidget() { widget_ = nullptr; }
 
   protected:
     // The window that holds the control; null before it is entered and once the window goes.
     std::shared_ptr<ControlHost> Host() const { return window_.lock(); }
     // Takes ownership of the widget until the window adopts it.
     void SetWidget(QWidget* widget);
-    // A control whose widget costs more than it is worth before its page is shown builds it
-    // here, at its first show or its first use; the widget then gets the control's values.
-    virtual QWidget* BuildWidget() { return nullptr; }
-    // One kept value on the built widget, then what the control keeps outside its values.
-    virtual void Apply(const std::string& /*name*/, const PropertyValue& /*value*/) {}
-    virtual void ApplyValues() {}
-    // The widget if it is built, nullptr if not yet, or NilObjectException once the window
-    // that showed it is gone.
-    QWidget* WidgetIfBuilt() const;
-    // The widget, built if it was not, or NilObjectException once the window that showed it
-    // is gone.
+    // The widget, or NilObjectException once the window that showed it is gone.
     QWidget& LiveWidget() const;
-    // A control that is not shown gets its font when it is first shown, or when it is given
-    // a text to lay out: a font is looked up and loaded at its first use, which for the
-    // controls of the pages not shown at start is later or never.
-    void ApplyFont();
-    void ApplyPendingFont();
     void Place();
 
   private:
@@ -109,12 +87,8 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     std::weak_ptr<ControlHost> window_;
     QWidget* widget_ = nullptr;
     bool widgetAdopted_ = false;
-    bool detached_ = false;
-    bool fontPending_ = false;
     std::unique_ptr<QObject> context_;
 
-    friend class Window;
     void SetWidgetFont();
-    void Adopt();
     void ApplyCommon(const std::string& name, const PropertyValue& value);
 };

@@ -54,24 +54,18 @@ void PagePanel::SetValue(long long value) {
     }
 }
 
-QWidget* PushButton::BuildWidget() {
+PushButton::PushButton() {
     auto* button = new QPushButton;
     QObject::connect(button, &QPushButton::clicked, Context(), [this] {
         if (Action) {
             RaiseEvent([this] { Action(*this); });
         }
     });
-    return button;
+    SetWidget(button);
 }
 
 void PushButton::SetProperty(const std::string& name, const PropertyValue& value) {
     Control::SetProperty(name, value);
-    if (WidgetIfBuilt()) {
-        Apply(name, value);
-    }
-}
-
-void PushButton::Apply(const std::string& name, const PropertyValue& value) {
     auto& button = static_cast<QPushButton&>(LiveWidget());
     if (name == "Caption") {
         button.setText(QString::fromStdString(std::get<std::string>(value)));
@@ -152,34 +146,22 @@ void PopupMenu::RaiseOpen() {
     }
 }
 
-QWidget* Label::BuildWidget() {
-    return new QLabel;
-}
-
-void Label::ApplyValues() {
-    if (unshown_) {
-        static_cast<QLabel&>(LiveWidget()).setText(QString::fromStdString(*unshown_));
-        unshown_.reset();
-    }
-    ApplyAlignment();
+Label::Label() {
+    SetWidget(new QLabel);
 }
 
 void Label::SetProperty(const std::string& name, const PropertyValue& value) {
     Control::SetProperty(name, value);
     if (name == "Text") {
         SetText(std::get<std::string>(value));
-    } else if ((name == "TextAlign" || name == "Multiline") && WidgetIfBuilt()) {
+    } else if (name == "TextAlign" || name == "Multiline") {
         ApplyAlignment();
     }
 }
 
 void Label::SetText(const std::string& text) {
     text_ = ShownPrefix(text, kShownInCell);
-    if (auto* label = static_cast<QLabel*>(WidgetIfBuilt())) {
-        label->setText(ShownLines(text, kShownInCell));
-    } else {
-        unshown_ = ShownLines(text, kShownInCell).toStdString();
-    }
+    static_cast<QLabel&>(LiveWidget()).setText(ShownLines(text, kShownInCell));
 }
 
 void Label::ApplyAlignment() {
@@ -194,26 +176,18 @@ void Label::ApplyAlignment() {
     label.setTextFormat(Qt::PlainText);
 }
 
-QWidget* TextArea::BuildWidget() {
+TextArea::TextArea() {
     auto* edit = new QPlainTextEdit;
     edit->setLineWrapMode(QPlainTextEdit::WidgetWidth);
     edit->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
-    return edit;
-}
-
-void TextArea::ApplyValues() {
-    if (unshown_) {
-        ApplyPendingFont();
-        static_cast<QPlainTextEdit&>(LiveWidget()).setPlainText(QString::fromStdString(*unshown_));
-        unshown_.reset();
-    }
+    SetWidget(edit);
 }
 
 void TextArea::SetProperty(const std::string& name, const PropertyValue& value) {
     Control::SetProperty(name, value);
     if (name == "Text") {
         SetText(std::get<std::string>(value));
-    } else if (WidgetIfBuilt()) {
+    } else {
         Apply(name, value);
     }
 }
@@ -237,46 +211,25 @@ void TextArea::Apply(const std::string& name, const PropertyValue& value) {
 
 void TextArea::SetText(const std::string& text) {
     text_ = ShownPrefix(text, kShownInTextArea);
-    if (auto* edit = static_cast<QPlainTextEdit*>(WidgetIfBuilt())) {
-        // The text is laid out at once, in the font it will be shown in.
-        ApplyPendingFont();
-        edit->setPlainText(ShownLines(text, kShownInTextArea));
-    } else {
-        unshown_ = ShownLines(text, kShownInTextArea).toStdString();
-    }
+    static_cast<QPlainTextEdit&>(LiveWidget()).setPlainText(ShownLines(text, kShownInTextArea));
 }
 
-QWidget* TabPanel::BuildWidget() {
+TabPanel::TabPanel() {
     auto* tabs = new QTabWidget;
-    QObject::connect(tabs, &QTabWidget::currentChanged, Context(), [this](int index) {
-        value_ = index;
+    QObject::connect(tabs, &QTabWidget::currentChanged, Context(), [this] {
         if (auto window = Host()) {
             window->UpdateVisibility();
         }
     });
-    return tabs;
-}
-
-// The window shows the controls of the chosen tab once the panel itself is shown.
-void TabPanel::ApplyValues() {
-    auto& tabs = static_cast<QTabWidget&>(LiveWidget());
-    const QSignalBlocker quiet(tabs);
-    for (const auto& title : titles_) {
-        tabs.addTab(new QWidget, QString::fromStdString(title));
-    }
-    tabs.setCurrentIndex(static_cast<int>(value_));
+    SetWidget(tabs);
 }
 
 void TabPanel::SetProperty(const std::string& name, const PropertyValue& value) {
     Control::SetProperty(name, value);
     if (name == "TabDefinition") {
+        auto& tabs = static_cast<QTabWidget&>(LiveWidget());
         for (const auto& title : SplitRows(std::get<std::string>(value))) {
-            titles_.push_back(title);
-            if (auto* tabs = static_cast<QTabWidget*>(WidgetIfBuilt())) {
-                tabs->addTab(new QWidget, QString::fromStdString(title));
-            } else if (value_ < 0) {
-                value_ = 0;
-            }
+            tabs.addTab(new QWidget, QString::fromStdString(title));
         }
     } else if (name == "Value") {
         SetValue(std::get<long long>(value));
@@ -284,14 +237,10 @@ void TabPanel::SetProperty(const std::string& name, const PropertyValue& value) 
 }
 
 long long TabPanel::Value() const {
-    WidgetIfBuilt();  // raises once the window is gone, as the other controls do
-    return value_;
+    return static_cast<const QTabWidget&>(LiveWidget()).currentIndex();
 }
 
+// A value that names no tab leaves the tab bar as it is.
 void TabPanel::SetValue(long long value) {
-    if (auto* tabs = static_cast<QTabWidget*>(WidgetIfBuilt())) {
-        tabs->setCurrentIndex(static_cast<int>(value));
-    } else if (value >= 0 && value < static_cast<long long>(titles_.size())) {
-        value_ = value;
-    }
+    static_cast<QTabWidget&>(LiveWidget()).setCurrentIndex(static_cast<int>(value));
 }

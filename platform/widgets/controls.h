@@ -2,7 +2,6 @@
 #pragma once
 
 #include <functional>
-#include <optional>
 #include <string>
 #include <vector>
 
@@ -26,19 +25,14 @@ class PagePanel : public Control {
     long long value_ = 0;
 };
 
-// Push buttons, labels, text areas and tab panels build their widgets when first shown or
-// used: most of them lie on the pages that the window does not show at start.
 class PushButton : public Control {
   public:
+    PushButton();
     void SetProperty(const std::string& name, const PropertyValue& value) override;
     void Push();  // as a click of the user
     bool PressAsDefault() override;
 
     std::function<void(PushButton&)> Action;
-
-  private:
-    QWidget* BuildWidget() override;
-    void Apply(const std::string& name, const PropertyValue& value) override;
 };
 
 // A popup of text rows. A row "-" is drawn as a dividing line; it can still be chosen by
@@ -65,46 +59,37 @@ class PopupMenu : public Control {
 // one only the prefix that it shows: nothing reads a label's text back but tests.
 class Label : public Control {
   public:
+    Label();
     void SetProperty(const std::string& name, const PropertyValue& value) override;
     std::string Text() const { return text_; }
     void SetText(const std::string& text);
 
   private:
-    QWidget* BuildWidget() override;
-    void ApplyValues() override;
     void ApplyAlignment();
     std::string text_;
-    std::optional<std::string> unshown_;  // what a widget not built yet is to show
 };
 
 class TextArea : public Control {
   public:
+    TextArea();
     void SetProperty(const std::string& name, const PropertyValue& value) override;
     std::string Text() const { return text_; }
     // Replaces the whole content; carriage returns end lines.
     void SetText(const std::string& text);
 
   private:
-    QWidget* BuildWidget() override;
-    void Apply(const std::string& name, const PropertyValue& value) override;
-    void ApplyValues() override;
+    void Apply(const std::string& name, const PropertyValue& value);
     std::string text_;
-    std::optional<std::string> unshown_;  // what a widget not built yet is to show
 };
 
 // Tabs whose controls show while their tab is chosen. Without tabs no tab is chosen; the
 // first tab made is chosen; a value that names no tab is ignored.
 class TabPanel : public Control {
   public:
+    TabPanel();
     void SetProperty(const std::string& name, const PropertyValue& value) override;
     long long Value() const;
     void SetValue(long long value);
     bool IsPageContainer() const override { return true; }
     bool ShowsPage(long long tabPanelIndex) const override { return tabPanelIndex - 1 == Value(); }
-
-  private:
-    QWidget* BuildWidget() override;
-    void ApplyValues() override;
-    std::vector<std::string> titles_;
-    long long value_ = -1;
 };

@@ -114,7 +114,7 @@ Listbox::Listbox() : model_(std::make_unique<ListModel>()) {
 Listbox::~Listbox() = default;
 
 void Listbox::DetachWidget() {
-    if (auto* view = static_cast<QTableView*>(BuiltWidget())) {
+    if (auto* view = static_cast<QTableView*>(Widget())) {
         static_cast<CellDelegate*>(view->itemDelegate())->Forget();
         // The model goes with the view, which may still be on its way out.
         model_.release()->setParent(view);

@@ -142,13 +142,9 @@ void Window::_AddControl(const Ref<Control>& control, const std::string& name) {
 const Ref<Control>& Window::_ControlByName(std::string_view name) const {
     static const Ref<Control> kNone;
     RequireMainThread();
-    if (lastFound_ < controls_.size() && controls_[lastFound_]->Name() == name) {
-        return controls_[lastFound_];
-    }
-    for (size_t i = 0; i < controls_.size(); ++i) {
-        if (controls_[i]->Name() == name) {
-            lastFound_ = i;
-            return controls_[i];
+    for (const auto& control : controls_) {
+        if (control->Name() == name) {
+            return control;
         }
     }
     return kNone;
@@ -186,26 +182,8 @@ void Window::UpdateVisibility() {
         return;
     }
     for (const auto& control : controls_) {
-        const bool shown = control->IsShown();
-        if (QWidget* widget = shown ? control->Widget() : control->BuiltWidget()) {
-            if (shown) {
-                control->ApplyPendingFont();
-            }
-            widget->setVisible(shown);
-        }
-    }
-}
-
-void Window::Restack(const Control& control) const {
-    auto at = std::find_if(controls_.begin(), controls_.end(),
-                           [&control](const auto& c) { return &c.Get() == &control; });
-    if (at == controls_.end()) {
-        return;
-    }
-    for (++at; at != controls_.end(); ++at) {
-        if (QWidget* above = (*at)->BuiltWidget()) {
-            control.BuiltWidget()->stackUnder(above);
-            return;
+        if (QWidget* widget = control->Widget()) {
+            widget->setVisible(control->IsShown());
         }
     }
 }

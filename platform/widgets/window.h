@@ -63,9 +63,6 @@ class Window : public PropertyObject,
     QWidget* Client() const override;
     QWidget* Native() const;
     void UpdateVisibility() override;
-    // A widget built late goes under the widgets of the controls after it, as if it had been
-    // built in the order of the controls.
-    void Restack(const Control& control) const override;
     void NativeClosed();
 
   private:
@@ -73,8 +70,6 @@ class Window : public PropertyObject,
     NativeWindow* native_ = nullptr;
     QWidget* client_ = nullptr;
     std::vector<Ref<Control>> controls_;
-    // The control found by name last: a handler's loop asks for the same one row after row.
-    mutable size_t lastFound_ = 0;
     Ref<::MenuBar> menuBar_;
     Color backColor_ = 0xFFFFFF;
     bool open_ = false;
