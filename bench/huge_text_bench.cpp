@@ -14,9 +14,9 @@
 #include <vector>
 
 #include "platform/runtime/runtime.h"
-#include "scripts/demo_tree.h"
 #include "shell/startup.h"
 #include "shell/window1.h"
+#include "tests/demo_tree.h"
 #include "timing.h"
 
 namespace fs = std::filesystem;

@@ -28,9 +28,9 @@
 #include "installer/copy.h"
 #include "platform/runtime/runtime.h"
 #include "platform/runtime/yield.h"
-#include "scripts/demo_tree.h"
 #include "shell/startup.h"
 #include "shell/window1.h"
+#include "tests/demo_tree.h"
 #include "timing.h"
 
 namespace fs = std::filesystem;

@@ -64,6 +64,7 @@ TEST_F(FolderItemTest, CopyFileToPutsTheCopyInsideAFolderOnly) {
 }
 
 struct Unreadable {
+    friend void PrintTo(const Unreadable& c, std::ostream* os) { *os << c.name; }
     const char* name;
     void (*make)(const fs::path& item);
 };

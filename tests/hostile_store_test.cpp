@@ -16,6 +16,7 @@ namespace fs = std::filesystem;
 namespace {
 
 struct HostileStore {
+    friend void PrintTo(const HostileStore& c, std::ostream* os) { *os << c.name; }
     const char* name;
     void (*make)(const fs::path& store);
     std::vector<std::string> documents;  // what the list shows afterwards

@@ -53,6 +53,7 @@ TEST_F(HugeTextTest, TheListAndTheReportHoldEveryByteAndDrawAPrefix) {
 }
 
 struct ShownCase {
+    friend void PrintTo(const ShownCase& c, std::ostream* os) { *os << c.name; }
     const char* name;
     std::string text;
     size_t limit;

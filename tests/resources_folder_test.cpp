@@ -10,6 +10,7 @@ namespace fs = std::filesystem;
 namespace {
 
 struct Layout {
+    friend void PrintTo(const Layout& c, std::ostream* os) { *os << c.name; }
     const char* name;
     const char* executable;  // relative to the temporary folder
     const char* resources;   // where the plug-ins are put, relative to it

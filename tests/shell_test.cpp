@@ -105,6 +105,7 @@ TEST_F(ShellTest, TheWindowHasAFixedSizeAndOnlyACloseButton) {
 }
 
 struct Transition {
+    friend void PrintTo(const Transition& c, std::ostream* os) { *os << c.name; }
     const char* name;
     State from;
     enum { Segment0, Segment1, Close } action;

@@ -9,6 +9,7 @@
 namespace {
 
 struct FieldCase {
+    friend void PrintTo(const FieldCase& c, std::ostream* os) { *os << c.name; }
     const char* name;
     std::string source;
     std::string separator;
