@@ -16,7 +16,7 @@
 #include "platform/runtime/runtime.h"
 #include "shell/startup.h"
 #include "shell/window1.h"
-#include "tests/demo_tree.h"
+#include "demo/demo_tree.h"
 #include "timing.h"
 
 namespace fs = std::filesystem;

@@ -5,7 +5,7 @@
 
 #include "results/results_store.h"
 #include "support.h"
-#include "tests/demo_tree.h"
+#include "demo/demo_tree.h"
 
 using namespace testsupport;
 

@@ -8,7 +8,7 @@
 #include "shell/startup.h"
 #include "shell/window1.h"
 #include "support.h"
-#include "tests/demo_tree.h"
+#include "demo/demo_tree.h"
 
 namespace testsupport {
 

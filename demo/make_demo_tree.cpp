@@ -3,7 +3,7 @@
 #include <cstdlib>
 #include <exception>
 
-#include "tests/demo_tree.h"
+#include "demo/demo_tree.h"
 
 int main(int argc, char** argv) {
     if (argc < 2) {

@@ -1,5 +1,5 @@
 // Demo trees, written with the SQLite library as another program would write them.
-#include "tests/demo_tree.h"
+#include "demo/demo_tree.h"
 
 #include <sqlite3.h>
 
