@@ -10,7 +10,6 @@
 #include <cmath>
 #include <cstdint>
 #include <cstdlib>
-#include <cstring>
 #include <limits>
 #include <vector>
 
@@ -139,35 +138,14 @@ bool IsTrimmed(char c) {
 
 }  // namespace
 
-size_t FindLowerAsciiInLongText(std::string_view source, std::string_view lower, size_t from) {
-    const char* const begin = source.data();
-    const char* const end = begin + (source.size() - lower.size()) + 1;  // behind the last start
-    const auto next = [end](const char* at, char c) {
-        const void* hit = std::memchr(at, c, static_cast<size_t>(end - at));
-        return hit ? static_cast<const char*>(hit) : end;
-    };
-    const char small = lower[0];
-    const char capital = static_cast<char>(small - ('a' - 'A'));
-    const char* nextSmall = next(begin + from, small);
-    const char* nextCapital = next(begin + from, capital);
-    for (;;) {
-        const char* at = std::min(nextSmall, nextCapital);
-        if (at == end) {
-            return std::string_view::npos;
-        }
-        size_t i = 1;
-        while (i < lower.size() && FoldAscii(at[i]) == lower[i]) {
-            ++i;
-        }
-        if (i == lower.size()) {
-            return static_cast<size_t>(at - begin);
-        }
-        if (at == nextSmall) {
-            nextSmall = next(at + 1, small);
-        } else {
-            nextCapital = next(at + 1, capital);
-        }
+size_t FindLowerAscii(std::string_view source, std::string_view lower, size_t from) {
+    if (lower.empty() || from > source.size()) {
+        return std::string_view::npos;
     }
+    const auto hit =
+        std::search(source.begin() + static_cast<std::ptrdiff_t>(from), source.end(), lower.begin(),
+                    lower.end(), [](char c, char small) { return FoldAscii(c) == small; });
+    return hit == source.end() ? std::string_view::npos : static_cast<size_t>(hit - source.begin());
 }
 
 std::string_view NthFieldView(std::string_view source, std::string_view separator, long long n) {

@@ -2,7 +2,6 @@
 // text, whole-text separators. Invalid UTF-8 is taken byte by byte and never fails.
 #pragma once
 
-#include <cstring>
 #include <string>
 #include <string_view>
 
@@ -17,39 +16,9 @@ inline char FoldAscii(char c) {
 }
 
 // Byte offset of the first `lower`, case aside, in `source` from byte `from`; npos where there
-// is none. `lower` is ASCII in small letters, so the search is byte by byte. Inline, so that a
-// reader that looks for the same marker row after row compares against its known letters.
-// A long text whose `lower` starts with a letter is searched out of line, by memchr for both
-// forms of the letter: a huge report line is scanned as fast as a line end is found.
-size_t FindLowerAsciiInLongText(std::string_view source, std::string_view lower, size_t from);
+// is none. `lower` is ASCII in small letters, so the search is byte by byte.
+size_t FindLowerAscii(std::string_view source, std::string_view lower, size_t from = 0);
 
-inline size_t FindLowerAscii(std::string_view source, std::string_view lower, size_t from = 0) {
-    if (lower.empty() || from > source.size() || lower.size() > source.size() - from) {
-        return std::string_view::npos;
-    }
-    const size_t last = source.size() - lower.size();
-    const bool letter = lower[0] >= 'a' && lower[0] <= 'z';
-    if (letter && last - from > 256) {
-        return FindLowerAsciiInLongText(source, lower, from);
-    }
-    for (size_t at = from; at <= last; ++at) {
-        if (!letter) {  // a byte with no case, such as a line end: memchr finds it fastest
-            const void* hit = std::memchr(source.data() + at, lower[0], last - at + 1);
-            if (!hit) {
-                return std::string_view::npos;
-            }
-            at = static_cast<size_t>(static_cast<const char*>(hit) - source.data());
-        }
-        size_t i = 0;
-        while (i < lower.size() && FoldAscii(source[at + i]) == lower[i]) {
-            ++i;
-        }
-        if (i == lower.size()) {
-            return at;
-        }
-    }
-    return std::string_view::npos;
-}
 // Position of the first occurrence of `find` at or after character `start` (0 or 1 mean the
 // beginning), counted in characters from 1; 0 when there is none or `find` is empty.
 long long InStr(long long start, std::string_view source, std::string_view find);
