@@ -138,16 +138,6 @@ bool IsTrimmed(char c) {
 
 }  // namespace
 
-size_t FindLowerAscii(std::string_view source, std::string_view lower, size_t from) {
-    if (lower.empty() || from > source.size()) {
-        return std::string_view::npos;
-    }
-    const auto hit =
-        std::search(source.begin() + static_cast<std::ptrdiff_t>(from), source.end(), lower.begin(),
-                    lower.end(), [](char c, char small) { return FoldAscii(c) == small; });
-    return hit == source.end() ? std::string_view::npos : static_cast<size_t>(hit - source.begin());
-}
-
 std::string_view NthFieldView(std::string_view source, std::string_view separator, long long n) {
     if (n < 1) {
         return {};

@@ -16,8 +16,23 @@ inline char FoldAscii(char c) {
 }
 
 // Byte offset of the first `lower`, case aside, in `source` from byte `from`; npos where there
-// is none. `lower` is ASCII in small letters, so the search is byte by byte.
-size_t FindLowerAscii(std::string_view source, std::string_view lower, size_t from = 0);
+// is none. `lower` is ASCII in small letters, so the search is byte by byte. Inline, so that the
+// list, which looks for the same marker in every row, compares against its known letters.
+inline size_t FindLowerAscii(std::string_view source, std::string_view lower, size_t from = 0) {
+    if (lower.empty() || from > source.size() || lower.size() > source.size() - from) {
+        return std::string_view::npos;
+    }
+    for (size_t at = from; at <= source.size() - lower.size(); ++at) {
+        size_t i = 0;
+        while (i < lower.size() && FoldAscii(source[at + i]) == lower[i]) {
+            ++i;
+        }
+        if (i == lower.size()) {
+            return at;
+        }
+    }
+    return std::string_view::npos;
+}
 
 // Position of the first occurrence of `find` at or after character `start` (0 or 1 mean the
 // beginning), counted in characters from 1; 0 when there is none or `find` is empty.

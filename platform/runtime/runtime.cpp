@@ -121,6 +121,17 @@ class OpenOnceShown : public QObject {
 };
 }  // namespace
 
+// Text keeps its designed shapes, unhinted, as macOS draws it: hinting would also set up
+// FreeType's hinter for every face and size at start-up, and load each glyph through it. Set
+// through the base class, the fonts that some desktops give to kinds of widget stay as they are.
+void UseUnhintedText() {
+#ifndef Q_OS_MACOS
+    QFont font = QGuiApplication::font();
+    font.setHintingPreference(QFont::PreferNoHinting);
+    QGuiApplication::setFont(font);
+#endif
+}
+
 void RuntimeInit(int argc, char** argv) {
 #ifdef __GLIBC__
     // A fixed threshold: the buffers of a huge text get mappings of their own and go back to
@@ -135,6 +146,7 @@ void RuntimeInit(int argc, char** argv) {
     argvKept[0] = argc > 0 && argv[0] ? argv[0] : fallbackName;
     argcKept = 1;
     ownApplication = std::make_unique<QApplication>(argcKept, argvKept);
+    UseUnhintedText();
     // The desktop ties the window to the installed desktop entry, and so to its icon, by this
     // name; the entry is named after the executable.
     QGuiApplication::setDesktopFileName(QCoreApplication::applicationName());

@@ -13,6 +13,8 @@ using ExceptionHelper = std::shared_ptr<RuntimeException> (*)(const std::functio
 // Makes the file-system root absolute, then the Qt application object unless one exists
 // already (tests make their own). Of the arguments only the program's name is used.
 void RuntimeInit(int argc, char** argv);
+// Has the application draw its text unhinted; RuntimeInit does so for the application it makes.
+void UseUnhintedText();
 void RuntimePerformInitializers();
 void _RuntimeSetExceptionHelper(ExceptionHelper helper);
 void _RuntimeSetReleaseStamp(double stamp);

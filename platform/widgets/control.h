@@ -66,6 +66,8 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     // The context of the control's signal connections: they end when the control does.
     QObject* Context() const { return context_.get(); }
     void AttachTo(const std::shared_ptr<ControlHost>& window);
+    // Sets the font that the control's properties give, if it has not been set yet.
+    void ApplyPendingFont();
     virtual void DetachWidget() { widget_ = nullptr; }
 
   protected:
@@ -87,6 +89,7 @@ class Control : public PropertyObject, public std::enable_shared_from_this<Contr
     std::weak_ptr<ControlHost> window_;
     QWidget* widget_ = nullptr;
     bool widgetAdopted_ = false;
+    bool fontPending_ = false;
     std::unique_ptr<QObject> context_;
 
     void SetWidgetFont();

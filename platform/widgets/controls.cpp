@@ -211,6 +211,7 @@ void TextArea::Apply(const std::string& name, const PropertyValue& value) {
 
 void TextArea::SetText(const std::string& text) {
     text_ = ShownPrefix(text, kShownInTextArea);
+    ApplyPendingFont();  // the text is laid out once, in the font it is shown in
     static_cast<QPlainTextEdit&>(LiveWidget()).setPlainText(ShownLines(text, kShownInTextArea));
 }
 

@@ -183,7 +183,11 @@ void Window::UpdateVisibility() {
     }
     for (const auto& control : controls_) {
         if (QWidget* widget = control->Widget()) {
-            widget->setVisible(control->IsShown());
+            const bool shown = control->IsShown();
+            if (shown) {
+                control->ApplyPendingFont();
+            }
+            widget->setVisible(shown);
         }
     }
 }
