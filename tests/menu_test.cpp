@@ -8,6 +8,7 @@
 #include <QMenuBar>
 #include <QPlainTextEdit>
 
+#include "platform/runtime/application_style.h"
 #include "platform/runtime/runtime.h"
 #include "shell/main_menu_bar.h"
 #include "shell/startup.h"
@@ -23,6 +24,20 @@ QMenu* NativeMenu(const Ref<class Window1>& window, const char* name) {
     auto* bar = static_cast<QMainWindow*>(window->Native())->menuBar();
     return bar->findChild<QMenu*>(name);
 }
+// The menu bar's overflow icon, handed over unread, draws as the desktop style's own; the
+// other icons come from that style unchanged.
+TEST(ApplicationStyleTest, IconsLookAsTheDesktopStylesOwn) {
+    ApplicationStyle style;
+    QStyle* desktop = QApplication::style();
+    for (auto which : {QStyle::SP_ToolBarHorizontalExtensionButton, QStyle::SP_MessageBoxWarning}) {
+        const QIcon icon = style.standardIcon(which);
+        ASSERT_FALSE(icon.isNull()) << which;
+        EXPECT_EQ(icon.pixmap(QSize(16, 16)).toImage(),
+                  desktop->standardIcon(which).pixmap(QSize(16, 16)).toImage())
+            << which;
+    }
+}
+
 }  // namespace
 
 // One bar for every window; its native form keeps the shortcuts users reach for.

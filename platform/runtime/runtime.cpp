@@ -16,6 +16,7 @@
 
 #include "platform/core/folder_item.h"
 #include "platform/runtime/application.h"
+#include "platform/runtime/application_style.h"
 
 namespace {
 ExceptionHelper exceptionHelper = nullptr;
@@ -146,6 +147,7 @@ void RuntimeInit(int argc, char** argv) {
     argvKept[0] = argc > 0 && argv[0] ? argv[0] : fallbackName;
     argcKept = 1;
     ownApplication = std::make_unique<QApplication>(argcKept, argvKept);
+    QApplication::setStyle(new ApplicationStyle);
     UseUnhintedText();
     // The desktop ties the window to the installed desktop entry, and so to its icon, by this
     // name; the entry is named after the executable.

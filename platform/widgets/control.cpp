@@ -76,7 +76,7 @@ void Control::PropertiesApplied() {
 }
 
 // A font is looked up and loaded at its first use: the controls of the pages not shown at
-// start get theirs when first shown, which keeps start-up to a painted window a fifth shorter.
+// start get theirs when first shown: 11% fewer instructions from start to a painted window.
 void Control::ApplyPendingFont() {
     if (fontPending_ && widget_) {
         fontPending_ = false;
