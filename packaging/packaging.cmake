@@ -36,6 +36,14 @@ else()
   install(FILES ${CMAKE_CURRENT_LIST_DIR}/${ORBELANE_PROGRAM}.svg
           DESTINATION share/icons/hicolor/scalable/apps)
 
+  # The licence and the history, where Debian keeps them. The history is compressed without
+  # name or time stamp, so that the same source gives the same package.
+  execute_process(COMMAND gzip -9nc INPUT_FILE ${CMAKE_CURRENT_LIST_DIR}/changelog
+                  OUTPUT_FILE ${CMAKE_CURRENT_BINARY_DIR}/changelog.gz COMMAND_ERROR_IS_FATAL ANY)
+  set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS ${CMAKE_CURRENT_LIST_DIR}/changelog)
+  install(FILES ${CMAKE_CURRENT_LIST_DIR}/copyright ${CMAKE_CURRENT_BINARY_DIR}/changelog.gz
+          DESTINATION share/doc/${ORBELANE_PROGRAM})
+
   # cpack -G DEB: the shared-library dependencies come from dpkg-shlibdeps.
   set(CPACK_GENERATOR DEB)
   set(CPACK_PACKAGE_NAME ${ORBELANE_PROGRAM})
@@ -44,10 +52,11 @@ else()
       CACHE STRING "Maintainer of the Debian package")
   set(CPACK_PACKAGE_DESCRIPTION_SUMMARY
       "Barcode verification results viewer and verifier plug-in installer")
+  # Lines of the long description stay within 80 columns in the package's control file.
   set(CPACK_PACKAGE_DESCRIPTION
-      "Lists the verification results that the Orbelane barcode verifier keeps in its SQLite
-store, shows any one of them as a full report, and installs the verifier plug-in into
-Adobe Illustrator or Adobe Acrobat.")
+      "Lists the verification results that the Orbelane barcode verifier keeps in
+its SQLite store, shows any one of them as a full report, and installs the
+verifier plug-in into Adobe Illustrator or Adobe Acrobat.")
   set(CPACK_PACKAGING_INSTALL_PREFIX /usr)
   set(CPACK_STRIP_FILES ON)
   set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
