@@ -1,6 +1,6 @@
 # The installed program: the executable, the plug-in items where the resources rule looks for
-# them (platform/resources_folder.h), the desktop entry and the icon. The Debian package and
-# the macOS application bundle are made from these rules.
+# them (platform/resources_folder.h), the desktop entry, the icon and the AppStream entry. The
+# Debian package and the macOS application bundle are made from these rules.
 
 set(ORBELANE_PROGRAM orbelane-verification-storage)
 
@@ -35,6 +35,9 @@ else()
           DESTINATION share/applications)
   install(FILES ${CMAKE_CURRENT_LIST_DIR}/${ORBELANE_PROGRAM}.svg
           DESTINATION share/icons/hicolor/scalable/apps)
+  # Named after its AppStream id, the macOS bundle's identifier.
+  install(FILES ${CMAKE_CURRENT_LIST_DIR}/com.orbelane.verification-storage.metainfo.xml
+          DESTINATION share/metainfo)
 
   # The licence and the history, where Debian keeps them. The history is compressed without
   # name or time stamp, so that the same source gives the same package.

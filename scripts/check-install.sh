@@ -1,8 +1,8 @@
 #!/usr/bin/env bash
 # Makes the Debian package of a built tree, unpacks it into a temporary folder and checks what
 # stands there: the program, both plug-in items where the program looks for them, the desktop
-# entry, the icon, the copyright file and the history, nothing else, and the libraries that the
-# package depends on.
+# entry, the icon, the AppStream entry, the copyright file and the history, nothing else, and
+# the libraries that the package depends on.
 # Usage: scripts/check-install.sh [BUILD_DIR]
 set -euo pipefail
 cd "$(dirname "$0")/.."
@@ -16,6 +16,7 @@ dpkg-deb -x "$deb" "$work/root"
 prefix=$work/root/usr
 
 name=orbelane-verification-storage
+id=com.orbelane.verification-storage
 failed=0
 expect() {
   if [ "$1" "$prefix/$2" ]; then
@@ -30,15 +31,20 @@ expect -f "share/$name/Quilbrant.aip/Contents/Info.plist"
 expect -f "share/$name/Ostrelin.acroplugin/Contents/Info.plist"
 expect -f "share/applications/$name.desktop"
 expect -f "share/icons/hicolor/scalable/apps/$name.svg"
+expect -f "share/metainfo/$id.metainfo.xml"
 expect -f "share/doc/$name/copyright"
 expect -f "share/doc/$name/changelog.gz"
 if [ -f "$prefix/share/applications/$name.desktop" ]; then
   desktop-file-validate "$prefix/share/applications/$name.desktop" || failed=1
 fi
+if [ -f "$prefix/share/metainfo/$id.metainfo.xml" ]; then
+  appstreamcli validate --no-net "$prefix/share/metainfo/$id.metainfo.xml" || failed=1
+fi
 # Nothing else is in the package: no test, benchmark or demo program, no static library.
 unexpected=$(cd "$prefix" && find . -type f | grep -v -e "^./bin/$name\$" -e "^./share/$name/" \
   -e "^./share/applications/$name.desktop\$" -e "^./share/icons/hicolor/scalable/apps/$name.svg\$" \
-  -e "^./share/doc/$name/copyright\$" -e "^./share/doc/$name/changelog.gz\$" || true)
+  -e "^./share/metainfo/$id.metainfo.xml\$" -e "^./share/doc/$name/copyright\$" \
+  -e "^./share/doc/$name/changelog.gz\$" || true)
 [ "$(ls -A "$work/root")" = usr ] || unexpected="$unexpected $(ls -A "$work/root")"
 if [ -n "$unexpected" ]; then
   echo "Unexpected files installed:"
@@ -54,4 +60,6 @@ done
 version=$(dpkg-deb -f "$deb" Version)
 newest=$(zcat "$prefix/share/doc/$name/changelog.gz" | sed -n '1s/^[^ ]* (\([^)]*\)).*/\1/p')
 [ "$newest" = "$version" ] || { echo "changelog's newest entry is $newest, not $version"; failed=1; }
+release=$(grep -o -m1 '<release version="[^"]*"' "$prefix/share/metainfo/$id.metainfo.xml" | cut -d'"' -f2)
+[ "$release" = "$version" ] || { echo "metainfo's newest release is $release, not $version"; failed=1; }
 exit $failed
