@@ -2,10 +2,12 @@
 # Makes the Debian package of a built tree, unpacks it into a temporary folder and checks what
 # stands there: the program, both plug-in items where the program looks for them, the desktop
 # entry, the icon, the AppStream entry, the copyright file and the history, nothing else, and
-# the libraries that the package depends on.
+# the libraries that the package depends on. lintian checks the package as Debian's archive
+# would, and appstreamcli the AppStream entry.
 # Usage: scripts/check-install.sh [BUILD_DIR]
 set -euo pipefail
 cd "$(dirname "$0")/.."
+scripts/install-deps.sh --package
 build=$(cd "${1:-build}" && pwd)
 work=$(mktemp -d -t orbelane-install.XXXXXX)
 trap 'rm -rf "$work"' EXIT
@@ -57,6 +59,14 @@ echo "package $(basename "$deb"): Depends: $depends"
 for library in libqt6widgets6 libsqlite3-0; do
   [[ $depends == *"$library "* ]] || { echo "MISSING dependency $library"; failed=1; }
 done
+# No error and no warning, but for the manual page: the program has no command line to describe.
+lintian --display-info --fail-on none "$deb" 2>&1 | grep -v "running with root privileges" |
+  tee "$work/lintian.log"
+if grep -E '^[EW]: ' "$work/lintian.log" | grep -qv ' no-manual-page '; then
+  echo "lintian: an error or a warning above"
+  failed=1
+fi
+
 version=$(dpkg-deb -f "$deb" Version)
 newest=$(zcat "$prefix/share/doc/$name/changelog.gz" | sed -n '1s/^[^ ]* (\([^)]*\)).*/\1/p')
 [ "$newest" = "$version" ] || { echo "changelog's newest entry is $newest, not $version"; failed=1; }
