@@ -65,5 +65,7 @@ verifier plug-in into Adobe Illustrator or Adobe Acrobat.")
   set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
   set(CPACK_DEBIAN_PACKAGE_SECTION graphics)
   set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
+  # Qt's SVG plug-ins draw the window's icon; nothing links them, so no dependency says so.
+  set(CPACK_DEBIAN_PACKAGE_RECOMMENDS libqt6svg6)
   include(CPack)
 endif()
