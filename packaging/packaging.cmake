@@ -6,9 +6,6 @@ set(ORBELANE_PROGRAM orbelane-verification-storage)
 
 if(APPLE)
   # X.app/Contents/MacOS/X, with the plug-in items in X.app/Contents/Resources.
-  if(NOT CMAKE_OSX_DEPLOYMENT_TARGET)
-    set(CMAKE_OSX_DEPLOYMENT_TARGET 12.0)  # the oldest macOS that current Qt 6 supports
-  endif()
   set_target_properties(${ORBELANE_PROGRAM} PROPERTIES
     MACOSX_BUNDLE TRUE
     OUTPUT_NAME "Orbelane Verification Storage"
