@@ -12,8 +12,13 @@ if(APPLE)
     MACOSX_BUNDLE_INFO_PLIST ${CMAKE_CURRENT_LIST_DIR}/Info.plist.in
     MACOSX_BUNDLE_BUNDLE_NAME "Orbelane Verification Storage"
     MACOSX_BUNDLE_GUI_IDENTIFIER com.orbelane.verification-storage
+    MACOSX_BUNDLE_ICON_FILE ${ORBELANE_PROGRAM}.icns
     MACOSX_BUNDLE_BUNDLE_VERSION ${PROJECT_VERSION}
     MACOSX_BUNDLE_SHORT_VERSION_STRING ${PROJECT_VERSION})
+  # The Dock's icon, made from the SVG by scripts/make-icns.sh.
+  target_sources(${ORBELANE_PROGRAM} PRIVATE ${CMAKE_CURRENT_LIST_DIR}/${ORBELANE_PROGRAM}.icns)
+  set_source_files_properties(${CMAKE_CURRENT_LIST_DIR}/${ORBELANE_PROGRAM}.icns
+                              PROPERTIES MACOSX_PACKAGE_LOCATION Resources)
   add_custom_command(TARGET ${ORBELANE_PROGRAM} POST_BUILD
     COMMAND ${CMAKE_COMMAND} -E copy_directory ${PROJECT_SOURCE_DIR}/resources
             "$<TARGET_BUNDLE_CONTENT_DIR:${ORBELANE_PROGRAM}>/Resources")
