@@ -21,7 +21,7 @@ name=orbelane-verification-storage
 id=com.orbelane.verification-storage
 failed=0
 expect() {
-  if [ "$1" "$prefix/$2" ]; then
+  if test "$1" "$prefix/$2"; then
     echo "ok      $2"
   else
     echo "MISSING $2"
