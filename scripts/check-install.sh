@@ -7,7 +7,7 @@
 # Usage: scripts/check-install.sh [BUILD_DIR]
 set -euo pipefail
 cd "$(dirname "$0")/.."
-scripts/install-deps.sh --package
+scripts/install-deps.sh --release
 build=$(cd "${1:-build}" && pwd)
 work=$(mktemp -d -t orbelane-install.XXXXXX)
 trap 'rm -rf "$work"' EXIT

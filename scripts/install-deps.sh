@@ -7,8 +7,8 @@ if [ "${1:-}" = "--demo" ]; then
   packages+=(xvfb)
 elif [ "${1:-}" = "--screenshots" ]; then
   packages+=(xvfb xdotool x11-apps imagemagick)
-elif [ "${1:-}" = "--package" ]; then
-  packages+=(lintian appstream)
+elif [ "${1:-}" = "--release" ]; then
+  packages+=(lintian appstream yamllint)
 fi
 missing=()
 for p in "${packages[@]}"; do
