@@ -12,7 +12,7 @@
 #include <vector>
 
 #include "installer/copy.h"
-#include "platform/runtime.h"
+#include "platform/runtime/runtime.h"
 #include "timing.h"
 
 namespace fs = std::filesystem;

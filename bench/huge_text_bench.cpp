@@ -13,10 +13,10 @@
 #include <string>
 #include <vector>
 
-#include "platform/runtime.h"
-#include "scripts/demo_tree.h"
+#include "platform/runtime/runtime.h"
 #include "shell/startup.h"
 #include "shell/window1.h"
+#include "demo/demo_tree.h"
 #include "timing.h"
 
 namespace fs = std::filesystem;
@@ -43,7 +43,7 @@ int MeasureOne(int argc, char** argv, const char* root) {
     QCoreApplication::processEvents();
     auto list = window->Listbox1();
     auto& view = *static_cast<QTableView*>(list->Widget());
-    // The report page is built at its first show, with its fonts: that is paid once, by any
+    // The report page lays its fonts and text out at its first show: that is paid once, by any
     // report. An ordinary report is opened and closed first, so the huge one is measured alone.
     const double unbuilt = ResidentMegabytes();
     list->SetListIndex(0);
@@ -124,7 +124,7 @@ void MeasureStore(const fs::path& root, const HugeStore& huge, int runs) {
         b, Median(shown), Median(closed), 100 * (Median(closed) / b - 1), Median(reloaded),
         100 * (Median(reloaded) / b - 1));
     std::printf(
-        "  the report page, built by an ordinary report before these: %+.1f MB, that first "
+        "  the report page, first shown by an ordinary report before these: %+.1f MB, that first "
         "open %.0f ms\n",
         Median(pages), Median(firsts));
     std::fflush(stdout);

@@ -26,11 +26,11 @@
 #include <vector>
 
 #include "installer/copy.h"
-#include "platform/runtime.h"
-#include "platform/yield.h"
-#include "scripts/demo_tree.h"
+#include "platform/runtime/runtime.h"
+#include "platform/runtime/yield.h"
 #include "shell/startup.h"
 #include "shell/window1.h"
+#include "demo/demo_tree.h"
 #include "timing.h"
 
 namespace fs = std::filesystem;

@@ -2,7 +2,7 @@
 // designed; the hairlines are a quarter-strength black over the frame's edges.
 #include "drawing/rect_box.h"
 
-#include "platform/property_block.h"
+#include "platform/core/property_block.h"
 
 namespace {
 constexpr double kArc = 14;

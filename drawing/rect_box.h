@@ -4,8 +4,8 @@
 
 #include <string>
 
-#include "platform/canvas.h"
-#include "platform/color.h"
+#include "platform/core/color.h"
+#include "platform/widgets/canvas.h"
 
 class RectBox : public Canvas {
   public:

@@ -1,7 +1,7 @@
 // CopyFileOrFolder: one item, a file or a whole folder tree, into a folder, under its own name.
 #include "installer/copy.h"
 
-#include "platform/runtime.h"
+#include "platform/runtime/yield.h"
 
 void CopyFileOrFolder(Ref<FolderItem> source, Ref<FolderItem> destination) {
     if (!source->Directory()) {

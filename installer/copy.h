@@ -1,7 +1,7 @@
 // The recursive copy of one plug-in item into a folder.
 #pragma once
 
-#include "platform/folder_item.h"
+#include "platform/core/folder_item.h"
 
 // Copies `source`, a file or a whole folder tree, into the folder `destination` under its own
 // name. The folder is created first and filled afterwards; nothing is checked and nothing

@@ -1,8 +1,9 @@
 // The Illustrator walk and the Acrobat path table.
 #include "installer/plugin_folders.h"
 
-#include "platform/message_box.h"
-#include "platform/text.h"
+#include "platform/core/text.h"
+#include "platform/runtime/message_box.h"
+#include "platform/runtime/yield.h"
 
 namespace {
 

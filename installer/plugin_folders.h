@@ -3,7 +3,7 @@
 
 #include <string>
 
-#include "platform/folder_item.h"
+#include "platform/core/folder_item.h"
 
 // Illustrator: Adobe / the highest "Adobe Illustrator <n>" / its first sub-folder without a
 // leading "." / Plug-ins, below application data. Where the walk stops, the user is told

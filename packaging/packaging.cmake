@@ -1,5 +1,5 @@
 # The installed program: the executable, the plug-in items where the resources rule looks for
-# them (platform/resources_folder.h), the desktop entry, the icon and the AppStream entry. The
+# them (platform/core/resources_folder.h), the desktop entry, the icon and the AppStream entry. The
 # Debian package and the macOS application bundle are made from these rules.
 
 set(ORBELANE_PROGRAM orbelane-verification-storage)

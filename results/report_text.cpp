@@ -4,7 +4,7 @@
 #include <optional>
 #include <string_view>
 
-#include "platform/text.h"
+#include "platform/core/text.h"
 
 namespace {
 const std::string kLineEnd = Chr(13);

@@ -3,7 +3,7 @@
 
 #include <string>
 
-#include "platform/database.h"
+#include "platform/core/database.h"
 
 // The one location of the store, in shell form.
 inline constexpr const char* kResultsStorePath =

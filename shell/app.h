@@ -2,7 +2,7 @@
 // desktop's appearance.
 #pragma once
 
-#include "platform/application.h"
+#include "platform/runtime/application.h"
 
 class App : public Application {
   public:

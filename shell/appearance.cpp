@@ -1,6 +1,6 @@
 // The window's background follows the desktop's light or dark appearance: at opening, and at
 // every change the desktop reports.
-#include "platform/appearance.h"
+#include "platform/runtime/appearance.h"
 #include "shell/app.h"
 #include "shell/window1.h"
 

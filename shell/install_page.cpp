@@ -1,8 +1,8 @@
 // The installation page: the product list and "Install Now", with every message of a press.
 #include "installer/copy.h"
 #include "installer/plugin_folders.h"
-#include "platform/message_box.h"
-#include "platform/text.h"
+#include "platform/core/text.h"
+#include "platform/runtime/message_box.h"
 #include "shell/window1.h"
 
 namespace {

@@ -1,6 +1,7 @@
 // The list page: every arrival on page 1 loads the whole store into Listbox1, and each cell
 // gets its stripe before the list draws its text.
-#include "platform/appearance.h"
+#include "platform/runtime/appearance.h"
+#include "platform/runtime/yield.h"
 #include "results/report_text.h"
 #include "results/results_store.h"
 #include "shell/window1.h"

@@ -1,5 +1,5 @@
 // The entry point: the run-time around _Main.
-#include "platform/runtime.h"
+#include "platform/runtime/runtime.h"
 #include "shell/startup.h"
 
 int main(int argc, char** argv) {

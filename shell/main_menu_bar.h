@@ -1,7 +1,7 @@
 // MainMenuBar: the one menu bar of the application and of every window.
 #pragma once
 
-#include "platform/menu.h"
+#include "platform/widgets/menu.h"
 
 class MainMenuBar : public MenuBar {
   public:

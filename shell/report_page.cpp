@@ -1,5 +1,5 @@
 // The report page: a double click reads the selected row from the store again and shows it.
-#include "platform/text.h"
+#include "platform/core/text.h"
 #include "results/report_text.h"
 #include "results/results_store.h"
 #include "shell/window1.h"

@@ -2,7 +2,7 @@
 // at late start-up, then the event loop.
 #include "shell/startup.h"
 
-#include "platform/runtime.h"
+#include "platform/runtime/runtime.h"
 #include "shell/app.h"
 #include "shell/main_menu_bar.h"
 #include "shell/window1.h"

@@ -3,7 +3,7 @@
 #include "shell/window1.h"
 
 #include "drawing/rect_box.h"
-#include "platform/property_block.h"
+#include "platform/core/property_block.h"
 #include "shell/main_menu_bar.h"
 
 namespace {

@@ -5,13 +5,13 @@
 
 #include <string>
 
-#include "platform/canvas.h"
-#include "platform/controls.h"
-#include "platform/folder_item.h"
-#include "platform/listbox.h"
-#include "platform/menu.h"
-#include "platform/segmented_control.h"
-#include "platform/window.h"
+#include "platform/core/folder_item.h"
+#include "platform/widgets/canvas.h"
+#include "platform/widgets/controls.h"
+#include "platform/widgets/listbox.h"
+#include "platform/widgets/menu.h"
+#include "platform/widgets/segmented_control.h"
+#include "platform/widgets/window.h"
 
 class RectBox;
 

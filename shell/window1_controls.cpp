@@ -4,7 +4,7 @@
 #include <vector>
 
 #include "drawing/rect_box.h"
-#include "platform/property_block.h"
+#include "platform/core/property_block.h"
 #include "shell/window1.h"
 
 namespace {

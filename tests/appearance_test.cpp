@@ -1,7 +1,7 @@
 // The window's background and the list's stripes follow the appearance: at opening and at every
 // change; a change with no window open makes a new one.
-#include "platform/appearance.h"
-#include "platform/notifications.h"
+#include "platform/runtime/appearance.h"
+#include "platform/runtime/notifications.h"
 #include "window_fixture.h"
 
 using namespace testsupport;

@@ -2,7 +2,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include "platform/folder_item.h"
+#include "platform/core/folder_item.h"
 #include "support.h"
 
 using namespace testsupport;
@@ -64,6 +64,7 @@ TEST_F(FolderItemTest, CopyFileToPutsTheCopyInsideAFolderOnly) {
 }
 
 struct Unreadable {
+    friend void PrintTo(const Unreadable& c, std::ostream* os) { *os << c.name; }
     const char* name;
     void (*make)(const fs::path& item);
 };

@@ -7,7 +7,7 @@
 #include <chrono>
 #include <future>
 
-#include "platform/database.h"
+#include "platform/core/database.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -16,6 +16,7 @@ namespace fs = std::filesystem;
 namespace {
 
 struct HostileStore {
+    friend void PrintTo(const HostileStore& c, std::ostream* os) { *os << c.name; }
     const char* name;
     void (*make)(const fs::path& store);
     std::vector<std::string> documents;  // what the list shows afterwards

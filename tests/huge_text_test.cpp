@@ -3,7 +3,7 @@
 #include <QLabel>
 #include <QPlainTextEdit>
 
-#include "platform/shown_text.h"
+#include "platform/widgets/shown_text.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -53,6 +53,7 @@ TEST_F(HugeTextTest, TheListAndTheReportHoldEveryByteAndDrawAPrefix) {
 }
 
 struct ShownCase {
+    friend void PrintTo(const ShownCase& c, std::ostream* os) { *os << c.name; }
     const char* name;
     std::string text;
     size_t limit;

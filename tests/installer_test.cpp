@@ -131,6 +131,7 @@ TEST_F(InstallerTest, TheDividerRowRaisesOnItsNilTarget) {
 // One install of the Acrobat DC plug-in over a tree that the user or the bundle made odd: the
 // message shown, and one item that must stand afterwards with what it holds, or must not stand.
 struct OddTree {
+    friend void PrintTo(const OddTree& c, std::ostream* os) { *os << c.name; }
     const char* name;
     void (*make)(const fs::path& bundle, const fs::path& product);
     const char* message;
@@ -247,6 +248,7 @@ TEST_F(InstallerTest, ReturnPressesInstallNowFromAnywhereOnThePage) {
 
 // The walk by itself, on the names that it meets.
 struct WalkCase {
+    friend void PrintTo(const WalkCase& c, std::ostream* os) { *os << c.name; }
     const char* name;
     std::vector<std::string>
         folders;           // below Adobe; each gets en_US/Plug-ins unless it ends in "/"

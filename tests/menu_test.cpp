@@ -7,10 +7,8 @@
 #include <QMenu>
 #include <QMenuBar>
 #include <QPlainTextEdit>
-#include <QStyle>
 
-#include "platform/application_style.h"
-#include "platform/runtime.h"
+#include "platform/runtime/runtime.h"
 #include "shell/main_menu_bar.h"
 #include "shell/startup.h"
 #include "shell/window1.h"
@@ -68,18 +66,4 @@ TEST_F(MenuTest, QuitEndsTheEventLoopAndClosesTheWindow) {
     EXPECT_EQ(QCoreApplication::exec(), 0);
     EXPECT_FALSE(window->IsOpen());
     EXPECT_TRUE(_GetImplicitWindow("Window1.Window1").IsNil());
-}
-
-// The menu bar's overflow icon, handed over unread, draws as the desktop style's own; the
-// other icons come from that style unchanged.
-TEST(ApplicationStyleTest, IconsLookAsTheDesktopStylesOwn) {
-    ApplicationStyle style;
-    QStyle* desktop = QApplication::style();
-    for (auto which : {QStyle::SP_ToolBarHorizontalExtensionButton, QStyle::SP_MessageBoxWarning}) {
-        const QIcon icon = style.standardIcon(which);
-        ASSERT_FALSE(icon.isNull()) << which;
-        EXPECT_EQ(icon.pixmap(QSize(16, 16)).toImage(),
-                  desktop->standardIcon(which).pixmap(QSize(16, 16)).toImage())
-            << which;
-    }
 }

@@ -1,6 +1,6 @@
 // The platform's core: the nullable reference, casts, and property blocks.
-#include "platform/property_block.h"
-#include "platform/ref.h"
+#include "platform/core/property_block.h"
+#include "platform/core/ref.h"
 
 #include <gtest/gtest.h>
 

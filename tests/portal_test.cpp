@@ -12,7 +12,7 @@
 #include <atomic>
 #include <csignal>
 
-#include "platform/appearance.h"
+#include "platform/runtime/appearance.h"
 #include "window_fixture.h"
 
 using namespace testsupport;

@@ -6,7 +6,7 @@
 #include <optional>
 #include <random>
 
-#include "platform/text.h"
+#include "platform/core/text.h"
 
 namespace {
 
@@ -21,6 +21,7 @@ const std::string kLayoutB =
     "Code is EAN 13\rCode reads 1234567890128" + kLayoutA.substr(kLayoutA.find("\r\r"));
 
 struct ReaderCase {
+    friend void PrintTo(const ReaderCase& c, std::ostream* os) { *os << c.name; }
     const char* name;
     std::string text;
     std::string listValue;

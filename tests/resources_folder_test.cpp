@@ -1,14 +1,14 @@
 // The resources rule on each layout the program ships in, and the window icon installed beside
 // the resources, built in a temporary folder.
-#include "platform/resources_folder.h"
+#include "platform/core/resources_folder.h"
 
 #include <QColor>
 #include <QGuiApplication>
 #include <QIcon>
 #include <QImage>
 
-#include "platform/folder_item.h"
-#include "platform/runtime.h"
+#include "platform/core/folder_item.h"
+#include "platform/runtime/runtime.h"
 #include "support.h"
 
 using namespace testsupport;
@@ -17,6 +17,7 @@ namespace fs = std::filesystem;
 namespace {
 
 struct Layout {
+    friend void PrintTo(const Layout& c, std::ostream* os) { *os << c.name; }
     const char* name;
     const char* executable;  // relative to the temporary folder
     const char* resources;   // where the plug-ins are put, relative to it

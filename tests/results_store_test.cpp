@@ -4,8 +4,8 @@
 #include <chrono>
 
 #include "results/results_store.h"
-#include "scripts/demo_tree.h"
 #include "support.h"
+#include "demo/demo_tree.h"
 
 using namespace testsupport;
 

@@ -7,8 +7,8 @@
 #include <string>
 #include <vector>
 
-#include "platform/row_store.h"
-#include "platform/text.h"
+#include "platform/core/row_store.h"
+#include "platform/core/text.h"
 
 namespace {
 
@@ -55,6 +55,9 @@ struct Driver {
 struct RandomCase {
     unsigned seed;
     bool inOrder;
+    friend void PrintTo(const RandomCase& c, std::ostream* os) {
+        *os << (c.inOrder ? "InOrder" : "Any") << "Seed" << c.seed;
+    }
 };
 
 class RowStoreRandomTest : public ::testing::TestWithParam<RandomCase> {};

@@ -7,7 +7,7 @@
 
 #include <thread>
 
-#include "platform/runtime.h"
+#include "platform/runtime/runtime.h"
 #include "window_fixture.h"
 
 using namespace testsupport;

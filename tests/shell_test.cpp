@@ -2,7 +2,7 @@
 #include <QMainWindow>
 #include <QPushButton>
 
-#include "platform/runtime.h"
+#include "platform/runtime/runtime.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -48,7 +48,7 @@ TEST_F(ShellTest, MainPaintsTheEmptyListFirstAndNeverTheInstallationPage) {
             }
             if (auto window = Cast<class Window1>(_GetImplicitWindow("Window1.Window1"))) {
                 auto* list = static_cast<QTableView*>(window->Listbox1()->Widget());
-                installPage += watched == window->PushButton1()->BuiltWidget() ? 1 : 0;
+                installPage += watched == window->PushButton1()->Widget() ? 1 : 0;
                 listPage += watched == list->viewport() ? 1 : 0;
             }
             return false;
@@ -105,6 +105,7 @@ TEST_F(ShellTest, TheWindowHasAFixedSizeAndOnlyACloseButton) {
 }
 
 struct Transition {
+    friend void PrintTo(const Transition& c, std::ostream* os) { *os << c.name; }
     const char* name;
     State from;
     enum { Segment0, Segment1, Close } action;

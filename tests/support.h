@@ -17,9 +17,9 @@
 #include <string>
 #include <vector>
 
-#include "platform/application.h"
-#include "platform/message_box.h"
-#include "platform/window.h"
+#include "platform/runtime/application.h"
+#include "platform/runtime/message_box.h"
+#include "platform/widgets/window.h"
 
 namespace testsupport {
 

@@ -3,8 +3,6 @@
 
 #include <gtest/gtest.h>
 
-#include "platform/runtime.h"
-
 int main(int argc, char** argv) {
     if (qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM")) {
         qputenv("QT_QPA_PLATFORM", "offscreen");
@@ -13,7 +11,6 @@ int main(int argc, char** argv) {
     // portal's own tests put a private bus here.
     qputenv("DBUS_SESSION_BUS_ADDRESS", "");
     QApplication app(argc, argv);
-    UseUnhintedText();  // as the program draws its text
     QApplication::setQuitOnLastWindowClosed(false);
     ::testing::InitGoogleTest(&argc, argv);
     return RUN_ALL_TESTS();

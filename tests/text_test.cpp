@@ -1,5 +1,5 @@
 // Text field operations: whole-text separators, no regard to case, positions in characters.
-#include "platform/text.h"
+#include "platform/core/text.h"
 
 #include <gtest/gtest.h>
 
@@ -9,6 +9,7 @@
 namespace {
 
 struct FieldCase {
+    friend void PrintTo(const FieldCase& c, std::ostream* os) { *os << c.name; }
     const char* name;
     std::string source;
     std::string separator;

@@ -5,10 +5,10 @@
 #include <QTableView>
 #include <QTest>
 
-#include "scripts/demo_tree.h"
 #include "shell/startup.h"
 #include "shell/window1.h"
 #include "support.h"
+#include "demo/demo_tree.h"
 
 namespace testsupport {
 

@@ -4,8 +4,8 @@
 #include <QMouseEvent>
 #include <QPushButton>
 
-#include "platform/runtime.h"
-#include "platform/yield.h"
+#include "platform/runtime/runtime.h"
+#include "platform/runtime/yield.h"
 #include "window_fixture.h"
 
 using namespace testsupport;

@@ -6,7 +6,7 @@
 #include <cstdlib>
 #include <string>
 
-#include "platform/text.h"
+#include "platform/core/text.h"
 #include "results/report_text.h"
 
 namespace {

@@ -11,7 +11,7 @@
 #include <iterator>
 #include <string>
 
-#include "platform/database.h"
+#include "platform/core/database.h"
 
 namespace {
 

@@ -1,0 +1,235 @@
+// The database classes over the SQLite C library.
+#include "platform/core/database.h"
+
+#include <sqlite3.h>
+
+#include <filesystem>
+#include <fstream>
+#include <string_view>
+#include <system_error>
+
+#include "platform/core/text.h"
+
+namespace {
+
+// What Field hands out for no such column, or no current row: a reference to it stays valid
+// until the program ends.
+constinit const Ref<DatabaseField> kNil;
+
+bool IsBlankTail(sqlite3* db, const char* tail) {
+    // Only blanks and comments may follow: a second statement makes the text fail.
+    while (tail && *tail) {
+        sqlite3_stmt* next = nullptr;
+        const char* rest = nullptr;
+        if (sqlite3_prepare_v2(db, tail, -1, &next, &rest) != SQLITE_OK) {
+            return false;
+        }
+        if (next) {
+            sqlite3_finalize(next);
+            return false;
+        }
+        if (rest == tail) {
+            return true;
+        }
+        tail = rest;
+    }
+    return true;
+}
+
+// A path as the path of a file: URI, with the characters that would end or escape it encoded.
+std::string UriPath(const std::string& path) {
+    static const char* const kHex = "0123456789ABCDEF";
+    std::string out;
+    for (const unsigned char c : path) {
+        if (c == '%' || c == '?' || c == '#' || c < 0x21 || c >= 0x7F) {
+            out += '%';
+            out += kHex[c >> 4];
+            out += kHex[c & 0xF];
+        } else {
+            out += static_cast<char>(c);
+        }
+    }
+    return out;
+}
+
+// A database file in WAL mode (versions 2 in its header) with no -wal file beside it: the
+// last writer has closed it, and everything stands in the file itself.
+bool IsWalWithoutLog(const std::filesystem::path& file) {
+    char header[20] = {};
+    std::ifstream in(file, std::ios::binary);
+    if (!in.read(header, sizeof header) ||
+        std::string_view(header, 16) != std::string_view("SQLite format 3\0", 16)) {
+        return false;
+    }
+    std::error_code error;
+    return (header[18] == 2 || header[19] == 2) &&
+           !std::filesystem::exists(file.string() + "-wal", error);
+}
+
+}  // namespace
+
+void DatabaseField::Refer(const char* text, size_t bytes) {
+    if (!kept_.empty()) {
+        kept_ = std::string();  // a huge text kept before goes back to the system
+    }
+    value_ = std::string_view(text, bytes);
+}
+
+void DatabaseField::Keep() {
+    if (value_.data() != kept_.data()) {
+        kept_.assign(value_);
+        value_ = kept_;
+    }
+}
+
+RecordSet::RecordSet(std::shared_ptr<sqlite3> connection, sqlite3_stmt* statement, bool atEnd)
+    : connection_(std::move(connection)), statement_(statement), atEnd_(atEnd) {
+    const int count = sqlite3_column_count(statement_);
+    for (int i = 0; i < count; ++i) {
+        const char* name = sqlite3_column_name(statement_, i);
+        columns_.emplace_back(name ? name : "");
+    }
+    fields_.resize(columns_.size());
+}
+
+RecordSet::~RecordSet() {
+    Close();
+}
+
+const Ref<DatabaseField>& RecordSet::Field(std::string_view name) const {
+    if (!statement_ || atEnd_) {
+        return kNil;
+    }
+    int column = -1;
+    // A loop asks the same names in the same order: the one behind the last is tried first.
+    if (nextAsked_ < asked_.size() && asked_[nextAsked_].first == name) {
+        column = asked_[nextAsked_].second;
+    } else {
+        nextAsked_ = 0;
+        for (; nextAsked_ < asked_.size(); ++nextAsked_) {
+            if (asked_[nextAsked_].first == name) {
+                column = asked_[nextAsked_].second;
+                break;
+            }
+        }
+    }
+    ++nextAsked_;
+    if (column < 0) {
+        for (size_t i = 0; i < columns_.size() && column < 0; ++i) {
+            if (TextEquals(columns_[i], name)) {
+                column = static_cast<int>(i);
+            }
+        }
+        if (column < 0) {
+            return kNil;
+        }
+        asked_.emplace_back(name, column);
+    }
+    // The column's value is asked for once, rather than once for its text and once for its
+    // length. SQLite hands it out unprotected, which only matters to another thread, and the
+    // connection is this thread's alone.
+    sqlite3_value* value = sqlite3_column_value(statement_, column);
+    const auto* text = reinterpret_cast<const char*>(sqlite3_value_text(value));
+    const auto bytes = text ? static_cast<size_t>(sqlite3_value_bytes(value)) : 0;
+    Ref<DatabaseField>& field = fields_[static_cast<size_t>(column)];
+    if (!field || field.Shared().use_count() > 1) {
+        if (field) {
+            field->Keep();  // it stays with its holder
+        }
+        field = New<DatabaseField>();
+    }
+    field->Refer(text ? text : "", bytes);
+    return field;
+}
+
+// A failure while stepping ends the rows, as the end of the result would.
+void RecordSet::MoveNext() {
+    if (statement_ && !atEnd_) {
+        KeepHeldFields();
+        atEnd_ = sqlite3_step(statement_) != SQLITE_ROW;
+    }
+}
+
+void RecordSet::KeepHeldFields() {
+    for (const auto& field : fields_) {
+        if (field && field.Shared().use_count() > 1) {
+            field->Keep();
+        }
+    }
+}
+
+void RecordSet::Close() {
+    KeepHeldFields();
+    if (statement_) {
+        sqlite3_finalize(statement_);
+        statement_ = nullptr;
+    }
+    fields_.clear();
+    atEnd_ = true;
+    connection_.reset();
+}
+
+bool SQLiteDatabase::Connect() {
+    Close();
+    if (DatabaseFile.IsNil()) {
+        return false;
+    }
+    // Only a regular file, after links are followed, is opened: open() on a FIFO waits for a
+    // writer for ever, and a folder, socket or device is no database either.
+    const std::filesystem::path& file = DatabaseFile->NativePath();
+    std::error_code error;
+    if (!std::filesystem::is_regular_file(file, error)) {
+        return false;
+    }
+    std::string uri = "file:" + UriPath(file.string()) + "?mode=ro";
+    if (IsWalWithoutLog(file)) {
+        // No writer has it open, so it is read as it stands: opened as usual, SQLite would
+        // leave a -wal and a -shm file beside the store.
+        uri += "&immutable=1";
+    }
+    sqlite3* db = nullptr;
+    // A connection lives inside one handler on the one thread, so SQLite's own lock on every
+    // call would be pure cost.
+    const int opened = sqlite3_open_v2(
+        uri.c_str(), &db, SQLITE_OPEN_READONLY | SQLITE_OPEN_URI | SQLITE_OPEN_NOMUTEX, nullptr);
+    std::shared_ptr<sqlite3> connection(db, sqlite3_close_v2);
+    if (opened != SQLITE_OK) {
+        return false;
+    }
+    sqlite3_busy_timeout(db, kBusyMilliseconds);
+    // Opening is lazy: reading the schema tells whether this is a database that can be read.
+    if (sqlite3_exec(db, "select count(*) from sqlite_master", nullptr, nullptr, nullptr) !=
+        SQLITE_OK) {
+        return false;
+    }
+    connection_ = std::move(connection);
+    return true;
+}
+
+Ref<RecordSet> SQLiteDatabase::SQLSelect(const std::string& statement) {
+    if (!connection_) {
+        return nullptr;
+    }
+    sqlite3_stmt* prepared = nullptr;
+    const char* tail = nullptr;
+    if (sqlite3_prepare_v2(connection_.get(), statement.c_str(), static_cast<int>(statement.size()),
+                           &prepared, &tail) != SQLITE_OK ||
+        !prepared) {
+        return nullptr;
+    }
+    const std::string rest(tail, statement.c_str() + statement.size() - tail);
+    if (!IsBlankTail(connection_.get(), rest.c_str())) {
+        sqlite3_finalize(prepared);
+        return nullptr;
+    }
+    const int first = sqlite3_step(prepared);
+    if (first != SQLITE_ROW && first != SQLITE_DONE) {
+        sqlite3_finalize(prepared);
+        return nullptr;
+    }
+    return New<RecordSet>(connection_, prepared, first == SQLITE_DONE);
+}
+
+void SQLiteDatabase::Close() {
+    connection_.reset();
+}

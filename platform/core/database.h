@@ -1,0 +1,86 @@
+// SQLiteDatabase, RecordSet and DatabaseField: reading one SQLite file. The connection is
+// read-only and never creates a file; a record set steps its cursor as the caller moves and
+// never holds the whole result.
+#pragma once
+
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "platform/core/folder_item.h"
+#include "platform/core/ref.h"
+
+struct sqlite3;
+struct sqlite3_stmt;
+
+class DatabaseField {
+  public:
+    DatabaseField() = default;
+    DatabaseField(const DatabaseField&) = delete;
+    DatabaseField& operator=(const DatabaseField&) = delete;
+
+    // The column's value as text; a NULL is the empty text.
+    std::string StringValue() const { return std::string(value_); }
+    operator std::string() const { return StringValue(); }
+    operator std::string_view() const { return value_; }
+
+    // Platform use. A field that nobody else holds is only a view of the current row's text,
+    // so a loop over a million rows copies none of it; a held field keeps its own copy before
+    // the row goes.
+    void Refer(const char* text, size_t bytes);
+    void Keep();
+
+  private:
+    std::string kept_;
+    std::string_view value_;
+};
+
+class RecordSet {
+  public:
+    RecordSet(std::shared_ptr<sqlite3> connection, sqlite3_stmt* statement, bool atEnd);
+    ~RecordSet();
+    RecordSet(const RecordSet&) = delete;
+    RecordSet& operator=(const RecordSet&) = delete;
+
+    // EOF of the platform (EOF itself is a macro of the C library): true behind the last row.
+    bool Eof() const { return atEnd_; }
+    // The column of the current row, found by name, case aside; Nil for no such column. The
+    // reference is the record set's own and lasts until the next MoveNext or Close: a caller
+    // that keeps the field keeps a copy of the reference, and the field keeps its text.
+    const Ref<DatabaseField>& Field(std::string_view name) const;
+    void MoveNext();
+    void Close();
+
+  private:
+    void KeepHeldFields();
+
+    std::shared_ptr<sqlite3> connection_;
+    sqlite3_stmt* statement_;
+    bool atEnd_;
+    std::vector<std::string> columns_;
+    // Names asked before, exactly as asked, with their column: a loop asks the same few.
+    mutable std::vector<std::pair<std::string, int>> asked_;
+    mutable size_t nextAsked_ = 0;
+    // One field object for each column, handed out again once its last holder has let go, so
+    // a loop over a million rows allocates nothing per field.
+    mutable std::vector<Ref<DatabaseField>> fields_;
+};
+
+class SQLiteDatabase {
+  public:
+    Ref<FolderItem> DatabaseFile;
+
+    // Opens DatabaseFile read-only if it is a regular file; true if it can now be queried. A
+    // busy or locked file is waited on for at most kBusyMilliseconds.
+    bool Connect();
+    // Runs one statement. Nil if it fails, or if any statement follows it in the text.
+    Ref<RecordSet> SQLSelect(const std::string& statement);
+    // Harmless on an object that never connected.
+    void Close();
+
+    static constexpr int kBusyMilliseconds = 2000;
+
+  private:
+    std::shared_ptr<sqlite3> connection_;
+};

@@ -1,0 +1,75 @@
+// Focus order over the control table: each control's place is the chain of TabIndex values
+// from the window down to it, so a container's controls come together at the container's place.
+#include "platform/widgets/focus_order.h"
+
+#include <QApplication>
+#include <QWidget>
+
+#include <algorithm>
+
+namespace {
+
+std::vector<long long> TabPath(const Control& control) {
+    std::vector<long long> path{control.IntegerProperty("TabIndex")};
+    for (auto above = control.Parent(); above; above = above->Parent()) {
+        path.push_back(above->IntegerProperty("TabIndex"));
+    }
+    std::reverse(path.begin(), path.end());
+    return path;
+}
+
+bool TabStop(const Control& control) {
+    const PropertyValue* stop = control.Property("TabStop");
+    return !stop || !std::holds_alternative<bool>(*stop) || std::get<bool>(*stop);
+}
+
+bool TakesTab(const QWidget& widget) {
+    return (widget.focusPolicy() & Qt::TabFocus) == Qt::TabFocus && widget.isEnabled();
+}
+
+}  // namespace
+
+std::vector<QWidget*> FocusOrder(const std::vector<Ref<Control>>& controls) {
+    std::vector<std::pair<std::vector<long long>, const Control*>> placed;
+    for (const auto& control : controls) {
+        if (control->IsShown() && TabStop(*control) && control->Widget()) {
+            placed.emplace_back(TabPath(*control), &control.Get());
+        }
+    }
+    std::stable_sort(placed.begin(), placed.end(),
+                     [](const auto& a, const auto& b) { return a.first < b.first; });
+    std::vector<QWidget*> order;
+    for (const auto& [path, control] : placed) {
+        QWidget* widget = control->Widget();
+        if (TakesTab(*widget)) {
+            order.push_back(widget);
+            continue;
+        }
+        // A control made of several focusable parts, such as the segments of a row.
+        for (QWidget* part : widget->findChildren<QWidget*>(Qt::FindDirectChildrenOnly)) {
+            if (TakesTab(*part) && part->isVisibleTo(widget)) {
+                order.push_back(part);
+            }
+        }
+    }
+    return order;
+}
+
+bool MoveFocus(const std::vector<Ref<Control>>& controls, bool forward) {
+    const std::vector<QWidget*> order = FocusOrder(controls);
+    if (order.empty()) {
+        return false;
+    }
+    const QWidget* focus = QApplication::focusWidget();
+    const auto at = std::find_if(order.begin(), order.end(), [focus](const QWidget* widget) {
+        return focus && (widget == focus || widget->isAncestorOf(focus));
+    });
+    const int count = static_cast<int>(order.size());
+    int next = forward ? 0 : count - 1;
+    if (at != order.end()) {
+        next = (static_cast<int>(at - order.begin()) + (forward ? 1 : count - 1)) % count;
+    }
+    order[static_cast<size_t>(next)]->setFocus(forward ? Qt::TabFocusReason
+                                                       : Qt::BacktabFocusReason);
+    return true;
+}

@@ -1,0 +1,200 @@
+// ListView: Return opens the selected row, Home and End go to the first and last row, typing
+// finds a row by the sort column, Tab leaves the list, Copy takes the row with its heading,
+// and a cell that is cut shows its whole text in a tooltip.
+#include "platform/widgets/list_view.h"
+
+#include <QApplication>
+#include <QClipboard>
+#include <QHeaderView>
+#include <QHelpEvent>
+#include <QKeyEvent>
+#include <QStyleOptionHeader>
+#include <QToolTip>
+
+#include <algorithm>
+#include <numeric>
+
+namespace {
+
+// A row on the clipboard is one line of fields: tabs and line breaks inside a cell become
+// blanks.
+QString OneLine(QString text) {
+    for (QChar& c : text) {
+        if (c == '\t' || c == '\r' || c == '\n') {
+            c = ' ';
+        }
+    }
+    return text;
+}
+
+// Qt measures header sections in the bold form of the header's font, which loads a second
+// font at start for nothing: the sections take the widths that the list gives them, and a
+// font's bold form is as high as the font. So the header's own font measures them.
+class ListHeader : public QHeaderView {
+  public:
+    explicit ListHeader(QWidget* parent) : QHeaderView(Qt::Horizontal, parent) {}
+
+  protected:
+    QSize sectionSizeFromContents(int logicalIndex) const override {
+        QStyleOptionHeader option;
+        initStyleOption(&option);
+        option.section = logicalIndex;
+        option.fontMetrics = fontMetrics();
+        option.text = model()->headerData(logicalIndex, orientation()).toString();
+        if (isSortIndicatorShown()) {
+            option.sortIndicator = QStyleOptionHeader::SortDown;
+        }
+        return style()->sizeFromContents(QStyle::CT_HeaderSection, &option, QSize(), this);
+    }
+};
+
+}  // namespace
+
+ListView::ListView() {
+    setHorizontalHeader(new ListHeader(this));
+    setTabKeyNavigation(false);
+}
+
+void ListView::SetDesignedWidths(std::vector<int> widths) {
+    designedWidths_ = std::move(widths);
+    FitColumns();
+}
+
+QString ListView::SelectionText() const {
+    if (!model() || !HasSelectedRow()) {
+        return {};
+    }
+    const QModelIndexList rows = selectionModel()->selectedRows();
+    if (rows.isEmpty()) {
+        return {};
+    }
+    QStringList headings;
+    QStringList cells;
+    for (int column = 0; column < model()->columnCount(); ++column) {
+        headings << OneLine(model()->headerData(column, Qt::Horizontal).toString());
+        cells << OneLine(model()->index(rows.first().row(), column).data().toString());
+    }
+    return headings.join('\t') + '\n' + cells.join('\t') + '\n';
+}
+
+void ListView::CopySelection() const {
+    if (const QString text = SelectionText(); !text.isEmpty()) {
+        QApplication::clipboard()->setText(text);
+    }
+}
+
+void ListView::keyPressEvent(QKeyEvent* event) {
+    const bool open = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
+    if (open && HasSelectedRow()) {
+        event->accept();
+        if (OpenRequested) {
+            OpenRequested();
+        }
+        return;
+    }
+    if (event->matches(QKeySequence::Copy)) {
+        // Qt's own copy would take the current cell alone.
+        event->accept();
+        CopySelection();
+        return;
+    }
+    QTableView::keyPressEvent(event);
+}
+
+// Home and End go to the first and last row, not to the ends of the row: the list never
+// scrolls sideways.
+QModelIndex ListView::moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) {
+    if ((action == MoveHome || action == MoveEnd) && model()) {
+        const int rows = model()->rowCount();
+        const int column = currentIndex().isValid() ? currentIndex().column() : 0;
+        return rows == 0 ? QModelIndex()
+                         : model()->index(action == MoveHome ? 0 : rows - 1, column);
+    }
+    return QTableView::moveCursor(action, modifiers);
+}
+
+// Letters typed in quick succession make one prefix; the same letter again steps on to the
+// next row that begins with it.
+void ListView::keyboardSearch(const QString& search) {
+    if (!model() || search.isEmpty()) {
+        return;
+    }
+    const bool goesOn =
+        searchClock_.isValid() && searchClock_.elapsed() < QApplication::keyboardInputInterval();
+    search_ = goesOn ? search_ + search : search;
+    searchClock_.start();
+    const bool oneLetter = search_.count(search_.front()) == search_.size();
+    const QString prefix = oneLetter ? search_.left(1) : search_;
+
+    const int rows = model()->rowCount();
+    const int current = currentIndex().isValid() ? currentIndex().row() : -1;
+    const int first = oneLetter ? current + 1 : std::max(current, 0);
+    const int column = SearchColumn();
+    for (int i = 0; i < rows; ++i) {
+        const QModelIndex index = model()->index((first + i) % rows, column);
+        if (index.data().toString().startsWith(prefix, Qt::CaseInsensitive)) {
+            setCurrentIndex(index);
+            return;
+        }
+    }
+}
+
+// The column that the list is sorted by, or the first.
+int ListView::SearchColumn() const {
+    const QHeaderView* header = horizontalHeader();
+    return header->isSortIndicatorShown() ? std::max(header->sortIndicatorSection(), 0) : 0;
+}
+
+// Also raised when the vertical scrollbar comes or goes, since that resizes the viewport.
+void ListView::resizeEvent(QResizeEvent* event) {
+    QTableView::resizeEvent(event);
+    FitColumns();
+}
+
+bool ListView::viewportEvent(QEvent* event) {
+    if (event->type() == QEvent::ToolTip) {
+        const auto* help = static_cast<QHelpEvent*>(event);
+        if (!ShowCutCellText(help->pos(), help->globalPos())) {
+            QToolTip::hideText();
+            event->ignore();
+        }
+        return true;
+    }
+    return QTableView::viewportEvent(event);
+}
+
+// The columns share the inside of the list in the designed proportions; the scrollbar, when
+// it shows, and the pixels lost to rounding come out of the widest column.
+void ListView::FitColumns() {
+    const int designed = std::accumulate(designedWidths_.begin(), designedWidths_.end(), 0);
+    if (designed <= 0) {
+        return;
+    }
+    const int inside = width() - 2 * frameWidth();
+    std::vector<int> widths;
+    for (const int width : designedWidths_) {
+        widths.push_back(std::max(width, 0) * inside / designed);
+    }
+    const auto widest =
+        std::max_element(designedWidths_.begin(), designedWidths_.end()) - designedWidths_.begin();
+    widths[widest] += viewport()->width() - std::accumulate(widths.begin(), widths.end(), 0);
+    for (size_t i = 0; i < widths.size(); ++i) {
+        setColumnWidth(static_cast<int>(i), std::max(widths[i], 0));
+    }
+}
+
+// Shows the whole text of the cell under the pointer when the cell is too narrow for it.
+bool ListView::ShowCutCellText(const QPoint& position, const QPoint& globalPosition) {
+    const QModelIndex index = indexAt(position);
+    if (!index.isValid()) {
+        return false;
+    }
+    const QString text = index.data().toString();
+    const QRect cell = visualRect(index);
+    const int margin = style()->pixelMetric(QStyle::PM_FocusFrameHMargin, nullptr, this) + 1;
+    if (fontMetrics().horizontalAdvance(text) + 2 * margin <= cell.width()) {
+        return false;
+    }
+    QToolTip::showText(globalPosition, text, viewport(), cell);
+    return true;
+}
