@@ -18,6 +18,11 @@ fs::path ResourcesFolderFor(const fs::path& executable) {
     return folder / (name + " Resources");
 }
 
+fs::path InstalledIconFor(const fs::path& executable) {
+    return ResourcesFolderFor(executable).parent_path() / "icons" / "hicolor" / "scalable" /
+           "apps" / (executable.filename().string() + ".svg");
+}
+
 fs::path ExecutableFile() {
     if (QCoreApplication::instance() == nullptr) {
         return {};

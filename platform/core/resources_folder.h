@@ -12,5 +12,9 @@
 // change while folders come and go.
 std::filesystem::path ResourcesFolderFor(const std::filesystem::path& executable);
 
+// The application's icon as installed beside those resources, in the desktop's icon theme
+// folders: PREFIX/share/icons/hicolor/scalable/apps/exe.svg for PREFIX/bin/exe.
+std::filesystem::path InstalledIconFor(const std::filesystem::path& executable);
+
 // The running program's executable, as Qt reports it; empty before the application object.
 std::filesystem::path ExecutableFile();

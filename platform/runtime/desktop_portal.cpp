@@ -2,6 +2,8 @@
 // org.freedesktop.appearance is 1 for dark, 2 for light and 0 for no preference.
 #include "platform/runtime/desktop_portal.h"
 
+#ifndef __APPLE__
+
 #include <QDBusConnection>
 #include <QDBusMessage>
 #include <QFileInfo>
@@ -92,3 +94,5 @@ void DesktopPortal::SettingChanged(const QString& group, const QString& key,
     }
     changed_(SchemeOf(value.variant()).value_or(Appearance::Light));
 }
+
+#endif

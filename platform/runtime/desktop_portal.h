@@ -2,13 +2,21 @@
 // read when asked, and followed through the portal's SettingChanged signal.
 #pragma once
 
-#include <QDBusVariant>
-#include <QObject>
-
 #include <functional>
 #include <optional>
 
 #include "platform/runtime/appearance.h"
+
+#ifdef __APPLE__
+// macOS has no such portal: Qt follows the system's appearance and tells a change by its events.
+class DesktopPortal {
+  public:
+    explicit DesktopPortal(std::function<void(Appearance)>) {}
+    std::optional<Appearance> Scheme() const { return std::nullopt; }
+};
+#else
+#include <QDBusVariant>
+#include <QObject>
 
 class DesktopPortal : public QObject {
     Q_OBJECT
@@ -28,3 +36,4 @@ class DesktopPortal : public QObject {
     std::function<void(Appearance)> changed_;
     bool connected_ = false;
 };
+#endif

@@ -2,7 +2,10 @@
 #include "platform/runtime/runtime.h"
 
 #include <QApplication>
+#include <QFile>
+#include <QFileInfo>
 #include <QFont>
+#include <QIcon>
 #include <QPointer>
 #include <QTimer>
 #include <QWidget>
@@ -15,6 +18,7 @@
 #endif
 
 #include "platform/core/folder_item.h"
+#include "platform/core/resources_folder.h"
 #include "platform/runtime/application.h"
 #include "platform/runtime/application_style.h"
 
@@ -133,6 +137,13 @@ void UseUnhintedText() {
 #endif
 }
 
+void UseInstalledIcon(const std::filesystem::path& executable) {
+    const QString file = QFile::decodeName(InstalledIconFor(executable).c_str());
+    const QIcon installed = QFileInfo::exists(file) ? QIcon(file) : QIcon();
+    QGuiApplication::setWindowIcon(
+        QIcon::fromTheme(QFile::decodeName(executable.filename().c_str()), installed));
+}
+
 void RuntimeInit(int argc, char** argv) {
 #ifdef __GLIBC__
     // A fixed threshold: the buffers of a huge text get mappings of their own and go back to
@@ -152,6 +163,10 @@ void RuntimeInit(int argc, char** argv) {
     // The desktop ties the window to the installed desktop entry, and so to its icon, by this
     // name; the entry is named after the executable.
     QGuiApplication::setDesktopFileName(QCoreApplication::applicationName());
+#ifndef Q_OS_MACOS
+    // On macOS the Dock shows the bundle's own icon, and windows bear none.
+    UseInstalledIcon(ExecutableFile());
+#endif
     // On macOS the application lives on with its menu bar when the window closes; elsewhere
     // a program without a window would have no way left to quit, so it ends with its window.
 #ifdef Q_OS_MACOS

@@ -2,6 +2,7 @@
 // onto Qt's application lifecycle.
 #pragma once
 
+#include <filesystem>
 #include <functional>
 #include <memory>
 
@@ -15,6 +16,9 @@ using ExceptionHelper = std::shared_ptr<RuntimeException> (*)(const std::functio
 void RuntimeInit(int argc, char** argv);
 // Has the application draw its text unhinted; RuntimeInit does so for the application it makes.
 void UseUnhintedText();
+// Gives the windows the icon installed with `executable`: its name in the desktop's icon theme
+// first, so that a theme may restyle it, else the installed file. RuntimeInit does so off macOS.
+void UseInstalledIcon(const std::filesystem::path& executable);
 void RuntimePerformInitializers();
 void _RuntimeSetExceptionHelper(ExceptionHelper helper);
 void _RuntimeSetReleaseStamp(double stamp);
