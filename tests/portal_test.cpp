@@ -1,6 +1,7 @@
 // The desktop's dark mode from the settings portal, on a private session bus that this test
 // starts and stops, with a stand-in portal in a thread of its own: followed on each change
-// through the window's colour and the list's stripes.
+// through the window's colour, the list's stripes and every text, read off the pixels.
+#include <QAbstractScrollArea>
 #include <QDBusAbstractAdaptor>
 #include <QDBusConnection>
 #include <QDBusVariant>
@@ -12,6 +13,7 @@
 #include <atomic>
 #include <csignal>
 
+#include "contrast.h"
 #include "platform/runtime/appearance.h"
 #include "window_fixture.h"
 
@@ -22,6 +24,14 @@ namespace {
 constexpr const char* kGroup = "org.freedesktop.appearance";
 constexpr const char* kKey = "color-scheme";
 constexpr uint kNoPreference = 0, kDark = 1, kLight = 2;
+// The least contrast of text on its ground that reads for a person with weaker sight.
+constexpr double kReadable = 4.5;
+
+const std::string kReport =
+    "Code is EAN 13\rCode reads 5012345678900\r\rSymbol Length 29.83 mm\rCode is Sized at 80 "
+    "%\rBWR Measured As 15 mic\rBar Deviance 6 mic\rAll bars within tolerance\rActual "
+    "Measurements = +- mic 0\r  Bar 1 330\r    Bar 2 660\r\rBar/Space Deviances = +- mic 0\rBar 1 "
+    "+4\rBar 2 -2\r";
 
 // What the desktop's portal answers about its settings; it keeps only the colour scheme.
 class StandInSettings : public QDBusAbstractAdaptor {
@@ -113,6 +123,29 @@ class PortalTest : public WindowTest {
     bool WaitForBackColor(const Ref<class Window1>& window, bool dark) {
         return QTest::qWaitFor([&] { return (window->BackColor() != 0xFFFFFF) == dark; }, 5000);
     }
+    // The desktop switches, and the window has followed.
+    void SwitchTo(const Ref<class Window1>& window, uint scheme) {
+        PrivateSessionBus::Switch(scheme);
+        ASSERT_TRUE(WaitForBackColor(window, scheme == kDark));
+        ProcessEvents();
+    }
+    // A control as the window shows it, with what lies beneath it.
+    static QImage Shown(const Ref<class Window1>& window, const Control& control) {
+        ProcessEvents();
+        return window->Client()
+            ->grab(QRect(control.Left(), control.Top(), control.Width(), control.Height()))
+            .toImage();
+    }
+    // The inside of a text pane, without its frame and scrollbar.
+    static QImage Inside(const TextArea& pane) {
+        ProcessEvents();
+        return static_cast<QAbstractScrollArea*>(pane.Widget())->viewport()->grab().toImage();
+    }
+    static void ExpectReadable(const QImage& image, const std::string& what) {
+        const QRgb ground = Ground(image);
+        const double contrast = Contrast(Ink(image, ground), ground);
+        EXPECT_GE(contrast, kReadable) << what << (IsDarkMode() ? " in the dark" : " in the light");
+    }
 };
 
 TEST_F(PortalTest, SwitchingRecoloursTheWindowAndTheStripes) {
@@ -134,6 +167,69 @@ TEST_F(PortalTest, SwitchingRecoloursTheWindowAndTheStripes) {
     EXPECT_EQ(Pixel(window->Client(), 5, 600), qRgb(255, 255, 255));
     EXPECT_EQ(Stripe(window, 0), qRgb(237, 243, 254));
     EXPECT_EQ(Stripe(window, 1), qRgb(255, 255, 255));
+}
+
+// The desktop's colours as the framework paints a control's stored solid black text and white
+// ground, in both appearances and after each switch: on the report page, the list page and the
+// installation page.
+TEST_F(PortalTest, EveryTextReadsOnItsGroundInBothAppearances) {
+    PrivateSessionBus::settings->scheme = kLight;
+    Store({{"1", "2018-11-04 10:00", "Cereal Box Front.ai", "A", kReport}});
+    auto window = StartUp();
+    DoubleClickRow(window, 0);
+    ASSERT_EQ(window->PagePanel1()->Value(), 2);
+    for (uint scheme : {kDark, kLight, kDark}) {
+        SwitchTo(window, scheme);
+        const QPalette desktop = QApplication::palette();
+        window->PagePanel1()->SetValue(2);
+        for (long long i = 0; i <= 7; ++i) {
+            ExpectReadable(Shown(window, *window->Label5(i)), "Label5(" + std::to_string(i) + ")");
+        }
+        for (long long i = 0; i <= 8; ++i) {
+            ExpectReadable(Shown(window, *window->Label6(i)), "Label6(" + std::to_string(i) + ")");
+        }
+        ExpectReadable(Shown(window, *window->Label4()), "Label4");
+        for (long long tab : {0, 1}) {
+            window->TabPanel1()->SetValue(tab);
+            const auto pane = tab == 0 ? window->TextArea1() : window->TextArea2();
+            const QImage inside = Inside(*pane);
+            EXPECT_EQ(Ground(inside), desktop.color(QPalette::Base).rgb())
+                << "a pane lies on the desktop's text background";
+            ExpectReadable(inside, tab == 0 ? "TextArea1" : "TextArea2");
+        }
+        window->TabPanel1()->SetValue(0);
+
+        window->PagePanel1()->SetValue(1);
+        ExpectReadable(Shown(window, *window->Label3()), "Label3");
+        window->PagePanel1()->SetValue(0);
+        ExpectReadable(Shown(window, *window->Label1()), "Label1");
+        const QImage disabled = Shown(window, *window->Label2());
+        EXPECT_EQ(Ink(disabled, Ground(disabled)),
+                  desktop.color(QPalette::Disabled, QPalette::WindowText).rgb())
+            << "a disabled label is greyed as the desktop greys it";
+    }
+}
+
+// Only solid black text and a solid white ground are the desktop's; any other value, however
+// close, is shown as it stands in either appearance.
+TEST_F(PortalTest, AnyOtherStoredColourStaysAsItIs) {
+    PrivateSessionBus::settings->scheme = kLight;
+    auto window = StartUp();
+    window->Label3()->SetProperty("TextColor", ColorWord{0x000001});
+    window->TextArea1()->SetProperty("BackColor", ColorWord{0xF0F0F0});
+    window->TextArea1()->SetProperty("TextColor", ColorWord{0x225684});
+    window->TextArea1()->SetText("Bar 1 330");
+    for (uint scheme : {kDark, kLight}) {
+        SwitchTo(window, scheme);
+        window->PagePanel1()->SetValue(1);
+        const QImage hint = Shown(window, *window->Label3());
+        EXPECT_EQ(Ink(hint, Ground(hint)), qRgb(0, 0, 1));
+        window->PagePanel1()->SetValue(2);
+        const QImage inside = Inside(*window->TextArea1());
+        EXPECT_EQ(Ground(inside), qRgb(0xF0, 0xF0, 0xF0));
+        // Thin strokes may cover no pixel whole, but a blend with a grey keeps the hue.
+        EXPECT_NEAR(QColor(Ink(inside, Ground(inside))).hue(), QColor(0x225684).hue(), 2);
+    }
 }
 
 }  // namespace

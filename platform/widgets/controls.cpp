@@ -11,7 +11,6 @@
 
 #include "platform/runtime/application.h"
 #include "platform/runtime/main_thread.h"
-#include "platform/runtime/qt_color.h"
 #include "platform/widgets/shown_text.h"
 
 namespace {
@@ -224,11 +223,6 @@ void TextArea::Apply(const std::string& name, const PropertyValue& value) {
         edit.setReadOnly(std::get<bool>(value));
     } else if (name == "Border") {
         edit.setFrameShape(std::get<bool>(value) ? QFrame::StyledPanel : QFrame::NoFrame);
-    } else if (name == "BackColor") {
-        const Color c = std::get<ColorWord>(value).value;
-        QPalette palette = edit.palette();
-        palette.setColor(QPalette::Base, ToQColor(c));
-        edit.setPalette(palette);
     } else if (name == "ScrollbarVertical") {
         edit.setVerticalScrollBarPolicy(std::get<bool>(value) ? Qt::ScrollBarAsNeeded
                                                               : Qt::ScrollBarAlwaysOff);
