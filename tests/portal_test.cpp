@@ -6,6 +6,7 @@
 #include <QDBusConnection>
 #include <QDBusVariant>
 #include <QProcess>
+#include <QPushButton>
 #include <QThread>
 
 #include <sys/prctl.h>
@@ -207,6 +208,34 @@ TEST_F(PortalTest, EveryTextReadsOnItsGroundInBothAppearances) {
         EXPECT_EQ(Ink(disabled, Ground(disabled)),
                   desktop.color(QPalette::Disabled, QPalette::WindowText).rgb())
             << "a disabled label is greyed as the desktop greys it";
+    }
+}
+
+// The segments take the palette's colours at each paint, so they follow each switch both ways;
+// the chosen one's title and focus ring read on its ground.
+TEST_F(PortalTest, TheSegmentsFollowEachSwitchAndShowTheirFocus) {
+    PrivateSessionBus::settings->scheme = kLight;
+    auto window = StartUp();
+    const auto segments =
+        window->MainTabs()->Widget()->findChildren<QPushButton*>(Qt::FindDirectChildrenOnly);
+    ASSERT_EQ(segments.size(), 2);
+    QPushButton* chosen = segments[1];
+    ASSERT_TRUE(chosen->isChecked());
+    const QPoint ring(3, chosen->height() / 2);  // inside the border, left of the title
+    for (uint scheme : {kDark, kLight, kDark, kLight}) {
+        SwitchTo(window, scheme);
+        const QImage other = segments[0]->grab().toImage();
+        EXPECT_EQ(Ground(other), QApplication::palette().color(QPalette::Button).rgb());
+        ExpectReadable(other, "Installation");
+        chosen->clearFocus();
+        const QImage plain = chosen->grab().toImage();
+        const QRgb ground = Ground(plain);
+        ExpectReadable(plain, "Verification Results");
+        EXPECT_EQ(plain.pixel(ring) | 0xFF000000u, ground);
+
+        chosen->setFocus(Qt::TabFocusReason);
+        const QImage focused = chosen->grab().toImage();
+        EXPECT_GE(Contrast(focused.pixel(ring), ground), kReadable) << "the focus ring shows";
     }
 }
 

@@ -4,6 +4,7 @@
 
 #include "platform/core/property_block.h"
 
+class QColor;
 class QWidget;
 
 // Gives the widget the control's TextColor and BackColor. Solid black text is the desktop's
@@ -12,3 +13,7 @@ class QWidget;
 // colours are left to the application's palette, which every widget takes as it paints, so a
 // change of appearance recolours them all at once.
 void ShowStoredColors(QWidget& widget, const PropertyObject& control);
+
+// The ground made darker or lighter, as little as it takes, for the text to read on it at
+// 4.5:1: a desktop's selection colour may be too light for white text.
+QColor ReadableGround(QColor ground, const QColor& text);
