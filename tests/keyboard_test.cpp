@@ -1,10 +1,13 @@
-// The real window driven by the keyboard: the list's keys, Tab to the segments, Copy of a row.
+// The real window driven by the keyboard: the list's keys and its focus, Tab to the segments,
+// Copy of a row.
 #include <QClipboard>
 #include <QMainWindow>
 #include <QMenu>
 #include <QMenuBar>
 #include <QPushButton>
 
+#include "contrast.h"
+#include "platform/runtime/appearance.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -46,6 +49,30 @@ TEST_F(KeyboardTest, EndSelectsTheLastRowAndReturnOpensItsReport) {
     Key(Qt::Key_Return);
     EXPECT_EQ(window->PagePanel1()->Value(), 2);
     EXPECT_EQ(window->Label6(7)->Text(), "Tin.ai");
+}
+
+// The list that gets the focus rings its first row without choosing it; the first Down chooses
+// that row. The ring and the chosen row's text read on their grounds in either appearance.
+TEST_F(KeyboardTest, TheFocusedListRingsItsCurrentRowWhichTheFirstDownChooses) {
+    Store({Row(1, "Box.ai"), Row(2, "Jar.ai"), Row(3, "Tin.ai")});
+    for (auto appearance : {Appearance::Light, Appearance::Dark}) {
+        SetAppearanceForTesting(appearance);
+        auto window = StartFocused();
+        QWidget* rows = View(window).viewport();
+        const QRgb ground = Pixel(rows, 120, 12);
+        EXPECT_GE(Contrast(Pixel(rows, 2, 12), ground), 4.5) << "the current row is ringed";
+        EXPECT_EQ(window->Listbox1()->ListIndex(), -1);
+
+        Key(Qt::Key_Down);
+        EXPECT_EQ(window->Listbox1()->ListIndex(), 0);
+        const QImage chosen = rows->grab(QRect(0, 0, 400, 25)).toImage();
+        EXPECT_GE(Contrast(Ink(chosen, Ground(chosen)), Ground(chosen)), 4.5);
+        Key(Qt::Key_Down);
+        EXPECT_EQ(window->Listbox1()->ListIndex(), 1);
+        window->Close();
+        ProcessEvents();
+    }
+    SetAppearanceForTesting(Appearance::Light);
 }
 
 TEST_F(KeyboardTest, TabLeavesTheListForTheSegmentsWhichSpaceChooses) {
