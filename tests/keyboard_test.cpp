@@ -1,5 +1,6 @@
 // The real window driven by the keyboard: the list's keys and its focus, Tab to the segments,
 // Copy of a row.
+#include <QAbstractScrollArea>
 #include <QClipboard>
 #include <QMainWindow>
 #include <QMenu>
@@ -75,6 +76,30 @@ TEST_F(KeyboardTest, TheFocusedListRingsItsCurrentRowWhichTheFirstDownChooses) {
     SetAppearanceForTesting(Appearance::Light);
 }
 
+// A page that comes into view takes the focus at its first control in the keyboard order when
+// the focus would go out of view with the page before; a text pane rings itself while focused.
+TEST_F(KeyboardTest, TheShownPageTakesTheFocusAtItsFirstControl) {
+    Store({Row(1, "Box.ai")});
+    auto window = StartUp();
+    QApplication::setActiveWindow(window->Native());
+    EXPECT_EQ(QApplication::focusWidget(), &View(window)) << "the list page, at start";
+
+    DoubleClickRow(window, 0);
+    ASSERT_EQ(window->PagePanel1()->Value(), 2);
+    EXPECT_EQ(QApplication::focusWidget(), window->PushButton2()->Widget());
+    auto* pane = static_cast<QAbstractScrollArea*>(window->TextArea1()->Widget());
+    const QRgb ground = Pixel(pane->viewport(), 1, 1);
+    Key(Qt::Key_Tab);
+    Key(Qt::Key_Tab);
+    ASSERT_EQ(QApplication::focusWidget(), pane);
+    EXPECT_GE(Contrast(Pixel(pane->viewport(), 1, 1), ground), 4.5) << "the pane is ringed";
+
+    window->PushButton2()->Push();
+    EXPECT_EQ(QApplication::focusWidget(), &View(window));
+    window->MainTabs()->Press(0);
+    EXPECT_EQ(QApplication::focusWidget(), window->PushButton1()->Widget());
+}
+
 TEST_F(KeyboardTest, TabLeavesTheListForTheSegmentsWhichSpaceChooses) {
     Store({Row(1, "Box.ai")});
     auto window = StartFocused();
@@ -84,6 +109,8 @@ TEST_F(KeyboardTest, TabLeavesTheListForTheSegmentsWhichSpaceChooses) {
     EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation");
     Key(Qt::Key_Space);
     EXPECT_EQ(window->PagePanel1()->Value(), 0);
+    EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation")
+        << "the focus stays on the segments that chose the page";
 }
 
 TEST_F(KeyboardTest, CopyPutsTheHeadingLineAndTheSelectedRowOnTheClipboard) {

@@ -12,6 +12,7 @@
 #include "platform/runtime/application.h"
 #include "platform/runtime/main_thread.h"
 #include "platform/widgets/shown_text.h"
+#include "platform/widgets/text_pane.h"
 
 namespace {
 
@@ -194,10 +195,7 @@ void Label::ApplyAlignment() {
 }
 
 QWidget* TextArea::BuildWidget() {
-    auto* edit = new QPlainTextEdit;
-    edit->setLineWrapMode(QPlainTextEdit::WidgetWidth);
-    edit->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
-    return edit;
+    return new TextPane;
 }
 
 void TextArea::ApplyValues() {
