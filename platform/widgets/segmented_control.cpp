@@ -5,7 +5,7 @@
 #include <QWidget>
 
 #include "platform/runtime/application.h"
-#include "platform/widgets/segment_button.h"
+#include "platform/widgets/segment_widgets.h"
 
 void SegmentedControlItem::SetTitle(const std::string& title) {
     title_ = title;
@@ -46,7 +46,7 @@ long long SegmentedControl::ItemList::Count() const {
 }
 
 SegmentedControl::SegmentedControl() {
-    SetWidget(new QWidget);
+    SetWidget(new SegmentRow);
 }
 
 void SegmentedControl::SizeToFit() {

@@ -14,6 +14,7 @@
 #include "platform/runtime/main_thread.h"
 #include "platform/runtime/qt_color.h"
 #include "platform/runtime/runtime.h"
+#include "platform/widgets/accessible_names.h"
 #include "platform/widgets/focus_order.h"
 #include "platform/widgets/menu.h"
 #include "platform/widgets/native_window.h"
@@ -224,6 +225,7 @@ void Window::UpdateVisibility() {
     if (focusLeaves) {
         FocusFirstOf(controls_, coming);
     }
+    NameByNeighbours(controls_);
 }
 
 void Window::Restack(const Control& control) const {

@@ -1,10 +1,16 @@
-// One segment of a SegmentedControl: a button that stays chosen, drawn from the palette that
-// the desktop has when it paints.
+// The widgets of a SegmentedControl: the row, and its segments, buttons that stay chosen, drawn
+// from the palette that the desktop has when they paint. A screen reader hears the row as a
+// list of page tabs, one of them selected.
 #pragma once
 
 #include <QPushButton>
 
 #include <functional>
+
+class SegmentRow : public QWidget {
+  public:
+    SegmentRow();
+};
 
 class SegmentButton : public QPushButton {
   public:

@@ -1,8 +1,12 @@
 // A segment paints itself with the colours of the palette at each paint, so a change of the
 // desktop's appearance shows at the next one, both ways; a style sheet would keep the colours
-// it was given when it was first applied.
-#include "platform/widgets/segment_button.h"
+// it was given when it was first applied. A segment chooses a page, as a tab does, so it is
+// told to a screen reader as a page tab, selected or not, rather than as the check box that a
+// button which stays down would be.
+#include "platform/widgets/segment_widgets.h"
 
+#include <QAccessible>
+#include <QAccessibleWidget>
 #include <QKeyEvent>
 #include <QPainter>
 #include <QPainterPath>
@@ -31,14 +35,67 @@ QPainterPath Outline(const QRectF& r, SegmentButton::Ends ends, qreal radius) {
     return path.simplified();
 }
 
+class SegmentAccessible : public QAccessibleWidget {
+  public:
+    explicit SegmentAccessible(SegmentButton* segment)
+        : QAccessibleWidget(segment, QAccessible::PageTab) {}
+
+    QString text(QAccessible::Text t) const override {
+        return t == QAccessible::Name ? Segment().text() : QAccessibleWidget::text(t);
+    }
+    QAccessible::State state() const override {
+        QAccessible::State state = QAccessibleWidget::state();
+        state.selectable = true;
+        state.selected = Segment().isChecked();
+        return state;
+    }
+    QStringList actionNames() const override {
+        return QStringList{pressAction()} + QAccessibleWidget::actionNames();
+    }
+    void doAction(const QString& name) override {
+        if (name == pressAction()) {
+            Segment().click();
+        } else {
+            QAccessibleWidget::doAction(name);
+        }
+    }
+
+  private:
+    QAbstractButton& Segment() const { return *static_cast<QAbstractButton*>(widget()); }
+};
+
+QAccessibleInterface* SegmentInterface(const QString&, QObject* object) {
+    if (auto* segment = dynamic_cast<SegmentButton*>(object)) {
+        return new SegmentAccessible(segment);
+    }
+    if (auto* row = dynamic_cast<SegmentRow*>(object)) {
+        return new QAccessibleWidget(row, QAccessible::PageTabList);
+    }
+    return nullptr;
+}
+
 }  // namespace
+
+SegmentRow::SegmentRow() {
+    [[maybe_unused]] static const bool installed =
+        (QAccessible::installFactory(SegmentInterface), true);
+}
 
 SegmentButton::SegmentButton(const QString& title, QWidget* parent, Ends ends,
                              std::function<void(int)> step)
-    : QPushButton(title, parent), ends_(ends), step_(std::move(step)) {
+    : QPushButton(parent), ends_(ends), step_(std::move(step)) {
+    // Qt asks for the accessibility of a button as its title and kind are set, and keeps the
+    // answer: set here, they find the object a segment already.
+    setText(title);
     setCheckable(true);
     // Reached by Tab, as on macOS; a click leaves the focus where it was.
     setFocusPolicy(Qt::TabFocus);
+    connect(this, &QAbstractButton::toggled, this, [this] {
+        QAccessible::State changed;
+        changed.selected = true;
+        QAccessibleStateChangeEvent event(this, changed);
+        QAccessible::updateAccessibility(&event);
+    });
 }
 
 // A segment takes the focus by Tab; the arrow keys choose its neighbour.
