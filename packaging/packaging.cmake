@@ -35,6 +35,10 @@ else()
           DESTINATION share/applications)
   install(FILES ${CMAKE_CURRENT_LIST_DIR}/${ORBELANE_PROGRAM}.svg
           DESTINATION share/icons/hicolor/scalable/apps)
+  # The window's icon (platform/runtime/installed_icon.h): the same picture, made from the SVG by
+  # "rsvg-convert -w 128 -h 128", since Qt reads SVG only with a plug-in of its own.
+  install(FILES ${CMAKE_CURRENT_LIST_DIR}/${ORBELANE_PROGRAM}.png
+          DESTINATION share/icons/hicolor/128x128/apps)
 
   # cpack -G DEB: the shared-library dependencies come from dpkg-shlibdeps.
   set(CPACK_GENERATOR DEB)

@@ -29,12 +29,14 @@ expect -f "share/$name/Quilbrant.aip/Contents/Info.plist"
 expect -f "share/$name/Ostrelin.acroplugin/Contents/Info.plist"
 expect -f "share/applications/$name.desktop"
 expect -f "share/icons/hicolor/scalable/apps/$name.svg"
+expect -f "share/icons/hicolor/128x128/apps/$name.png"
 if [ -f "$prefix/share/applications/$name.desktop" ]; then
   desktop-file-validate "$prefix/share/applications/$name.desktop" || failed=1
 fi
 # Nothing else is in the package: no test, benchmark or demo program, no static library.
 unexpected=$(cd "$prefix" && find . -type f | grep -v -e "^./bin/$name\$" -e "^./share/$name/" \
   -e "^./share/applications/$name.desktop\$" -e "^./share/icons/hicolor/scalable/apps/$name.svg\$" \
+  -e "^./share/icons/hicolor/128x128/apps/$name.png\$" \
   || true)
 [ "$(ls -A "$work/root")" = usr ] || unexpected="$unexpected $(ls -A "$work/root")"
 if [ -n "$unexpected" ]; then

@@ -18,6 +18,15 @@ fs::path ResourcesFolderFor(const fs::path& executable) {
     return folder / (name + " Resources");
 }
 
+fs::path InstalledIconFor(const fs::path& executable) {
+    const fs::path folder = executable.parent_path();
+    if (folder.filename() != "bin") {
+        return {};
+    }
+    const std::string name = executable.filename().string();
+    return folder.parent_path() / "share/icons/hicolor/128x128/apps" / (name + ".png");
+}
+
 fs::path ExecutableFile() {
     if (QCoreApplication::instance() == nullptr) {
         return {};

@@ -12,5 +12,11 @@
 // change while folders come and go.
 std::filesystem::path ResourcesFolderFor(const std::filesystem::path& executable);
 
+// The window icon installed with the program under a prefix, beside the desktop entry's own
+// scalable one: PREFIX/share/icons/hicolor/128x128/apps/exe.png, a picture that Qt reads without
+// plug-ins. Empty for the other layouts: a bundle has its icon in its Info.plist, and a build
+// tree none.
+std::filesystem::path InstalledIconFor(const std::filesystem::path& executable);
+
 // The running program's executable, as Qt reports it; empty before the application object.
 std::filesystem::path ExecutableFile();

@@ -17,6 +17,7 @@
 #include "platform/core/folder_item.h"
 #include "platform/runtime/application.h"
 #include "platform/runtime/application_style.h"
+#include "platform/runtime/installed_icon.h"
 
 namespace {
 ExceptionHelper exceptionHelper = nullptr;
@@ -153,6 +154,7 @@ void RuntimeInit(int argc, char** argv) {
     // The desktop ties the window to the installed desktop entry, and so to its icon, by this
     // name; the entry is named after the executable.
     QGuiApplication::setDesktopFileName(QCoreApplication::applicationName());
+    UseInstalledIcon();
     // On macOS the application lives on with its menu bar when the window closes; elsewhere
     // a program without a window would have no way left to quit, so it ends with its window.
 #ifdef Q_OS_MACOS
