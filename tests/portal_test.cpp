@@ -16,6 +16,7 @@
 
 #include "contrast.h"
 #include "platform/runtime/appearance.h"
+#include "platform/runtime/yield.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -237,6 +238,54 @@ TEST_F(PortalTest, TheSegmentsFollowEachSwitchAndShowTheirFocus) {
         const QImage focused = chosen->grab().toImage();
         EXPECT_GE(Contrast(focused.pixel(ring), ground), kReadable) << "the focus ring shows";
     }
+}
+
+// A desktop that switches many times a second, during a list load or under an open message box:
+// the window ends in the appearance that the desktop has last.
+TEST_F(PortalTest, TheWindowEndsInTheAppearanceThatTheDesktopHasLast) {
+    PrivateSessionBus::settings->scheme = kLight;
+    Store(demo::InventedResults(500));
+    auto window = StartUp();
+    const auto endsIn = [&](bool dark) {
+        EXPECT_TRUE(WaitForBackColor(window, dark));
+        QTest::qWait(100);  // every notification delivered
+        EXPECT_EQ(IsDarkMode(), dark);
+        EXPECT_EQ(window->BackColor(), dark ? FillColor() : 0xFFFFFFu);
+        const QImage hint = Shown(window, *window->Label3());
+        EXPECT_EQ(Ink(hint, Ground(hint)),
+                  QApplication::palette().color(QPalette::WindowText).rgb());
+    };
+    for (int i = 0; i < 21; ++i) {
+        PrivateSessionBus::Switch(i % 2 ? kLight : kDark);
+    }
+    endsIn(true);
+
+    // The load holds every event back, the desktop's word too, until it has ended.
+    SetYieldIntervalForTesting(std::chrono::nanoseconds(0));
+    int paints = 0;
+    SetYieldPaintObserverForTesting([&](auto) {
+        if (++paints <= 3) {
+            PrivateSessionBus::Switch(paints % 2 ? kLight : kDark);
+        }
+    });
+    window->PagePanel1()->SetValue(1);
+    SetYieldPaintObserverForTesting(nullptr);
+    SetYieldIntervalForTesting(std::chrono::milliseconds(50));
+    ASSERT_GT(paints, 3);
+    endsIn(false);
+
+    // A message box runs the event loop: the window follows while the box is open.
+    QTimer::singleShot(0, [&] {
+        for (uint scheme : {kDark, kLight, kDark}) {
+            PrivateSessionBus::Switch(scheme);
+        }
+        EXPECT_TRUE(WaitForBackColor(window, true));
+        QWidget* box = QApplication::activeModalWidget();
+        ASSERT_NE(box, nullptr);
+        box->close();
+    });
+    MsgBox("Unable to install at this time 1");
+    endsIn(true);
 }
 
 // Only solid black text and a solid white ground are the desktop's; any other value, however
