@@ -2,30 +2,27 @@
 // starts and stops, with a stand-in portal in a thread of its own: followed on each change
 // through the window's colour, the list's stripes and every text, read off the pixels.
 #include <QAbstractScrollArea>
-#include <QDBusAbstractAdaptor>
 #include <QDBusConnection>
-#include <QDBusVariant>
 #include <QProcess>
 #include <QPushButton>
 #include <QThread>
 
 #include <sys/prctl.h>
 
-#include <atomic>
 #include <csignal>
 
 #include "contrast.h"
 #include "platform/runtime/appearance.h"
 #include "platform/runtime/yield.h"
+#include "scripts/stand_in_portal.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
 
 namespace {
 
-constexpr const char* kGroup = "org.freedesktop.appearance";
-constexpr const char* kKey = "color-scheme";
-constexpr uint kNoPreference = 0, kDark = 1, kLight = 2;
+constexpr uint kNoPreference = StandInSettings::kNoPreference;
+constexpr uint kDark = StandInSettings::kDark, kLight = StandInSettings::kLight;
 // The least contrast of text on its ground that reads for a person with weaker sight.
 constexpr double kReadable = 4.5;
 
@@ -34,27 +31,6 @@ const std::string kReport =
     "%\rBWR Measured As 15 mic\rBar Deviance 6 mic\rAll bars within tolerance\rActual "
     "Measurements = +- mic 0\r  Bar 1 330\r    Bar 2 660\r\rBar/Space Deviances = +- mic 0\rBar 1 "
     "+4\rBar 2 -2\r";
-
-// What the desktop's portal answers about its settings; it keeps only the colour scheme.
-class StandInSettings : public QDBusAbstractAdaptor {
-    Q_OBJECT
-    Q_CLASSINFO("D-Bus Interface", "org.freedesktop.portal.Settings")
-
-  public:
-    explicit StandInSettings(QObject* portal) : QDBusAbstractAdaptor(portal) {}
-    std::atomic<uint> scheme{kNoPreference};
-
-  public slots:
-    // As the portal's own Read, the value comes wrapped twice.
-    QDBusVariant Read(const QString& group, const QString& key) {
-        const QVariant value =
-            group == kGroup && key == kKey ? QVariant(scheme.load()) : QVariant();
-        return QDBusVariant(QVariant::fromValue(QDBusVariant(value)));
-    }
-
-  signals:
-    void SettingChanged(const QString& group, const QString& key, const QDBusVariant& value);
-};
 
 // A session bus of our own, with nothing to activate, and the stand-in portal on it.
 class PrivateSessionBus : public ::testing::Environment {
@@ -80,8 +56,8 @@ class PrivateSessionBus : public ::testing::Environment {
         settings = new StandInSettings(portal_);
         portal_->moveToThread(&thread_);
         QDBusConnection bus = QDBusConnection::connectToBus(QString(address), "stand-in");
-        ASSERT_TRUE(bus.registerObject("/org/freedesktop/portal/desktop", portal_));
-        bus.registerService("org.freedesktop.portal.Desktop");
+        ASSERT_TRUE(bus.registerObject(StandInSettings::kPath, portal_));
+        bus.registerService(StandInSettings::kService);
     }
     void TearDown() override {
         QDBusConnection::disconnectFromBus("stand-in");
@@ -94,13 +70,8 @@ class PrivateSessionBus : public ::testing::Environment {
 
     // The desktop switches: the portal tells everyone who listens.
     static void Switch(uint scheme) {
-        settings->scheme = scheme;
         QMetaObject::invokeMethod(
-            settings,
-            [scheme] {
-                emit settings->SettingChanged(kGroup, kKey, QDBusVariant(QVariant(scheme)));
-            },
-            Qt::BlockingQueuedConnection);
+            settings, [scheme] { settings->Switch(scheme); }, Qt::BlockingQueuedConnection);
     }
 
     static inline StandInSettings* settings = nullptr;
@@ -311,5 +282,3 @@ TEST_F(PortalTest, AnyOtherStoredColourStaysAsItIs) {
 }
 
 }  // namespace
-
-#include "portal_test.moc"
