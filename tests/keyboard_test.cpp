@@ -1,10 +1,14 @@
-// The real window driven by the keyboard: the list's keys, Tab to the segments, Copy of a row.
+// The real window driven by the keyboard: the list's keys and its focus, Tab to the segments,
+// Copy of a row.
+#include <QAbstractScrollArea>
 #include <QClipboard>
 #include <QMainWindow>
 #include <QMenu>
 #include <QMenuBar>
 #include <QPushButton>
 
+#include "contrast.h"
+#include "platform/runtime/appearance.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -48,6 +52,54 @@ TEST_F(KeyboardTest, EndSelectsTheLastRowAndReturnOpensItsReport) {
     EXPECT_EQ(window->Label6(7)->Text(), "Tin.ai");
 }
 
+// The list that gets the focus rings its first row without choosing it; the first Down chooses
+// that row. The ring and the chosen row's text read on their grounds in either appearance.
+TEST_F(KeyboardTest, TheFocusedListRingsItsCurrentRowWhichTheFirstDownChooses) {
+    Store({Row(1, "Box.ai"), Row(2, "Jar.ai"), Row(3, "Tin.ai")});
+    for (auto appearance : {Appearance::Light, Appearance::Dark}) {
+        SetAppearanceForTesting(appearance);
+        auto window = StartFocused();
+        QWidget* rows = View(window).viewport();
+        const QRgb ground = Pixel(rows, 120, 12);
+        EXPECT_GE(Contrast(Pixel(rows, 2, 12), ground), 4.5) << "the current row is ringed";
+        EXPECT_EQ(window->Listbox1()->ListIndex(), -1);
+
+        Key(Qt::Key_Down);
+        EXPECT_EQ(window->Listbox1()->ListIndex(), 0);
+        const QImage chosen = rows->grab(QRect(0, 0, 400, 25)).toImage();
+        EXPECT_GE(Contrast(Ink(chosen, Ground(chosen)), Ground(chosen)), 4.5);
+        Key(Qt::Key_Down);
+        EXPECT_EQ(window->Listbox1()->ListIndex(), 1);
+        window->Close();
+        ProcessEvents();
+    }
+    SetAppearanceForTesting(Appearance::Light);
+}
+
+// A page that comes into view takes the focus at its first control in the keyboard order when
+// the focus would go out of view with the page before; a text pane rings itself while focused.
+TEST_F(KeyboardTest, TheShownPageTakesTheFocusAtItsFirstControl) {
+    Store({Row(1, "Box.ai")});
+    auto window = StartUp();
+    QApplication::setActiveWindow(window->Native());
+    EXPECT_EQ(QApplication::focusWidget(), &View(window)) << "the list page, at start";
+
+    DoubleClickRow(window, 0);
+    ASSERT_EQ(window->PagePanel1()->Value(), 2);
+    EXPECT_EQ(QApplication::focusWidget(), window->PushButton2()->Widget());
+    auto* pane = static_cast<QAbstractScrollArea*>(window->TextArea1()->Widget());
+    const QRgb ground = Pixel(pane->viewport(), 1, 1);
+    Key(Qt::Key_Tab);
+    Key(Qt::Key_Tab);
+    ASSERT_EQ(QApplication::focusWidget(), pane);
+    EXPECT_GE(Contrast(Pixel(pane->viewport(), 1, 1), ground), 4.5) << "the pane is ringed";
+
+    window->PushButton2()->Push();
+    EXPECT_EQ(QApplication::focusWidget(), &View(window));
+    window->MainTabs()->Press(0);
+    EXPECT_EQ(QApplication::focusWidget(), window->PushButton1()->Widget());
+}
+
 TEST_F(KeyboardTest, TabLeavesTheListForTheSegmentsWhichSpaceChooses) {
     Store({Row(1, "Box.ai")});
     auto window = StartFocused();
@@ -57,6 +109,8 @@ TEST_F(KeyboardTest, TabLeavesTheListForTheSegmentsWhichSpaceChooses) {
     EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation");
     Key(Qt::Key_Space);
     EXPECT_EQ(window->PagePanel1()->Value(), 0);
+    EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation")
+        << "the focus stays on the segments that chose the page";
 }
 
 TEST_F(KeyboardTest, CopyPutsTheHeadingLineAndTheSelectedRowOnTheClipboard) {

@@ -11,22 +11,32 @@
 namespace {
 constexpr int kMiddleLightness = 128;
 
+// Every role of every group is set: a role left out would keep the light palette's colour.
+// Its texts read at 8:1 or more on their grounds, and its disabled text is greyed.
 QPalette DarkPalette() {
-    QPalette p;
     const QColor window(0x32, 0x32, 0x32);
     const QColor base(0x1E, 0x1E, 0x1E);
+    const QColor button(0x3C, 0x3C, 0x3C);
     const QColor text(0xE6, 0xE6, 0xE6);
-    p.setColor(QPalette::Window, window);
-    p.setColor(QPalette::WindowText, text);
-    p.setColor(QPalette::Base, base);
+    const QColor disabledText(0x80, 0x80, 0x80);
+    QPalette p(text, button, button.lighter(150), button.darker(200), button.lighter(125), text,
+               Qt::white, base, window);
+    p.setColor(QPalette::Midlight, button.lighter(125));
+    p.setColor(QPalette::Shadow, Qt::black);
     p.setColor(QPalette::AlternateBase, window);
-    p.setColor(QPalette::Text, text);
-    p.setColor(QPalette::Button, window);
     p.setColor(QPalette::ButtonText, text);
     p.setColor(QPalette::Highlight, QColor(0x2A, 0x62, 0xC9));
     p.setColor(QPalette::HighlightedText, Qt::white);
+    p.setColor(QPalette::Link, QColor(0x7A, 0xB0, 0xFF));
+    p.setColor(QPalette::LinkVisited, QColor(0xB8, 0x94, 0xFF));
     p.setColor(QPalette::ToolTipBase, base);
     p.setColor(QPalette::ToolTipText, text);
+    p.setColor(QPalette::PlaceholderText, disabledText);
+    for (auto role : {QPalette::WindowText, QPalette::Text, QPalette::ButtonText}) {
+        p.setColor(QPalette::Disabled, role, disabledText);
+    }
+    p.setColor(QPalette::Disabled, QPalette::Base, window);
+    p.setColor(QPalette::Disabled, QPalette::Highlight, QColor(0x50, 0x50, 0x50));
     return p;
 }
 

@@ -8,7 +8,7 @@
 #include <cmath>
 
 #include "platform/runtime/main_thread.h"
-#include "platform/runtime/qt_color.h"
+#include "platform/widgets/desktop_colors.h"
 #include "platform/widgets/qt_font.h"
 
 Control::Control() : context_(std::make_unique<QObject>()) {}
@@ -50,15 +50,8 @@ void Control::ApplyCommon(const std::string& name, const PropertyValue& value) {
         widget_->setEnabled(std::get<bool>(value));
     } else if (name == "HelpTag") {
         widget_->setToolTip(QString::fromStdString(std::get<std::string>(value)));
-    } else if (name == "TextColor") {
-        const Color c = std::get<ColorWord>(value).value;
-        // Active and inactive only: a disabled control keeps the desktop's greyed text.
-        QPalette palette = widget_->palette();
-        for (auto group : {QPalette::Active, QPalette::Inactive}) {
-            palette.setColor(group, QPalette::WindowText, ToQColor(c));
-            palette.setColor(group, QPalette::Text, ToQColor(c));
-        }
-        widget_->setPalette(palette);
+    } else if (name == "TextColor" || name == "BackColor") {
+        ShowStoredColors(*widget_, *this);
     }
 }
 

@@ -11,8 +11,8 @@
 
 #include "platform/runtime/application.h"
 #include "platform/runtime/main_thread.h"
-#include "platform/runtime/qt_color.h"
 #include "platform/widgets/shown_text.h"
+#include "platform/widgets/text_pane.h"
 
 namespace {
 
@@ -177,7 +177,7 @@ void Label::ApplyAlignment() {
 }
 
 TextArea::TextArea() {
-    auto* edit = new QPlainTextEdit;
+    auto* edit = new TextPane;
     edit->setLineWrapMode(QPlainTextEdit::WidgetWidth);
     edit->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     SetWidget(edit);
@@ -198,11 +198,6 @@ void TextArea::Apply(const std::string& name, const PropertyValue& value) {
         edit.setReadOnly(std::get<bool>(value));
     } else if (name == "Border") {
         edit.setFrameShape(std::get<bool>(value) ? QFrame::StyledPanel : QFrame::NoFrame);
-    } else if (name == "BackColor") {
-        const Color c = std::get<ColorWord>(value).value;
-        QPalette palette = edit.palette();
-        palette.setColor(QPalette::Base, ToQColor(c));
-        edit.setPalette(palette);
     } else if (name == "ScrollbarVertical") {
         edit.setVerticalScrollBarPolicy(std::get<bool>(value) ? Qt::ScrollBarAsNeeded
                                                               : Qt::ScrollBarAlwaysOff);

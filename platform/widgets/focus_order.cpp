@@ -73,3 +73,23 @@ bool MoveFocus(const std::vector<Ref<Control>>& controls, bool forward) {
                                                        : Qt::BacktabFocusReason);
     return true;
 }
+
+const Control* OwnerOf(const std::vector<Ref<Control>>& controls, const QWidget* widget) {
+    for (const auto& control : controls) {
+        const QWidget* own = control->Widget();
+        if (widget && own && (own == widget || own->isAncestorOf(widget))) {
+            return &control.Get();
+        }
+    }
+    return nullptr;
+}
+
+void FocusFirstOf(const std::vector<Ref<Control>>& controls,
+                  const std::vector<const Control*>& among) {
+    for (QWidget* widget : FocusOrder(controls)) {
+        if (std::find(among.begin(), among.end(), OwnerOf(controls, widget)) != among.end()) {
+            widget->setFocus(Qt::OtherFocusReason);
+            return;
+        }
+    }
+}

@@ -12,3 +12,8 @@ class QWidget;
 std::vector<QWidget*> FocusOrder(const std::vector<Ref<Control>>& controls);
 // Moves the focus to the next or previous of them, round the ends; false if there is none.
 bool MoveFocus(const std::vector<Ref<Control>>& controls, bool forward);
+// The control whose widget is or holds `widget`; nullptr for none.
+const Control* OwnerOf(const std::vector<Ref<Control>>& controls, const QWidget* widget);
+// Gives the focus to the first widget in the keyboard order that belongs to one of `among`.
+void FocusFirstOf(const std::vector<Ref<Control>>& controls,
+                  const std::vector<const Control*>& among);

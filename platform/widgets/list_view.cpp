@@ -1,6 +1,7 @@
 // ListView: Return opens the selected row, Home and End go to the first and last row, typing
 // finds a row by the sort column, Tab leaves the list, Copy takes the row with its heading,
-// and a cell that is cut shows its whole text in a tooltip.
+// a cell that is cut shows its whole text in a tooltip, and the focused list rings its current
+// row.
 #include "platform/widgets/list_view.h"
 
 #include <QApplication>
@@ -8,6 +9,7 @@
 #include <QHeaderView>
 #include <QHelpEvent>
 #include <QKeyEvent>
+#include <QPainter>
 #include <QStyleOptionHeader>
 #include <QToolTip>
 
@@ -15,6 +17,8 @@
 #include <numeric>
 
 namespace {
+
+constexpr qreal kRingWidth = 2.0;
 
 // A row on the clipboard is one line of fields: tabs and line breaks inside a cell become
 // blanks.
@@ -92,6 +96,15 @@ void ListView::keyPressEvent(QKeyEvent* event) {
         }
         return;
     }
+    // The list that gets the focus makes its first row current, and rings it, without choosing
+    // it: the first arrow key chooses that row rather than its neighbour.
+    const bool arrow = event->key() == Qt::Key_Down || event->key() == Qt::Key_Up;
+    if (arrow && event->modifiers() == Qt::NoModifier && !HasSelectedRow() &&
+        currentIndex().isValid()) {
+        event->accept();
+        setCurrentIndex(currentIndex());
+        return;
+    }
     if (event->matches(QKeySequence::Copy)) {
         // Qt's own copy would take the current cell alone.
         event->accept();
@@ -99,6 +112,22 @@ void ListView::keyPressEvent(QKeyEvent* event) {
         return;
     }
     QTableView::keyPressEvent(event);
+}
+
+// The current row's ring, in the colour of the row's text, which reads on the row's ground.
+void ListView::paintEvent(QPaintEvent* event) {
+    QTableView::paintEvent(event);
+    const QModelIndex current = currentIndex();
+    if (!hasFocus() || !current.isValid() || !model()) {
+        return;
+    }
+    const QRect row = visualRect(current.siblingAtColumn(0))
+                          .united(visualRect(current.siblingAtColumn(model()->columnCount() - 1)));
+    const bool selected = selectionModel()->isRowSelected(current.row(), current.parent());
+    QPainter painter(viewport());
+    painter.setPen(
+        QPen(palette().color(selected ? QPalette::HighlightedText : QPalette::Text), kRingWidth));
+    painter.drawRect(QRectF(row).adjusted(1.5, 1.5, -1.5, -1.5));
 }
 
 // Home and End go to the first and last row, not to the ends of the row: the list never

@@ -31,6 +31,7 @@ class ListView : public QTableView {
 
   protected:
     void keyPressEvent(QKeyEvent* event) override;
+    void paintEvent(QPaintEvent* event) override;
     QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
     void keyboardSearch(const QString& search) override;
     void resizeEvent(QResizeEvent* event) override;

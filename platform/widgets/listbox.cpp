@@ -9,6 +9,7 @@
 
 #include "platform/runtime/application.h"
 #include "platform/runtime/qt_color.h"
+#include "platform/widgets/desktop_colors.h"
 #include "platform/widgets/list_model.h"
 #include "platform/widgets/list_view.h"
 
@@ -26,9 +27,13 @@ class CellDelegate : public QStyledItemDelegate {
             return;
         }
         // The selection moves with the current row, so the style's tint of the focused
-        // current row would only hide the ground of an unselected one.
+        // current row would only hide the ground of an unselected one; the view rings it.
+        // The selected row's text reads on the desktop's selection colour.
         QStyleOptionViewItem plain = option;
         plain.state &= ~QStyle::State_HasFocus;
+        plain.palette.setColor(QPalette::Highlight,
+                               ReadableGround(option.palette.color(QPalette::Highlight),
+                                              option.palette.color(QPalette::HighlightedText)));
         QStyledItemDelegate::paint(painter, plain, index);
     }
 

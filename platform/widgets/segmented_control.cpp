@@ -1,50 +1,11 @@
-// SegmentedControl over a row of checkable buttons that touch each other.
+// SegmentedControl over a row of buttons that stay chosen and touch each other.
 #include "platform/widgets/segmented_control.h"
 
-#include <QKeyEvent>
 #include <QPushButton>
 #include <QWidget>
 
-#include <functional>
-
 #include "platform/runtime/application.h"
-
-namespace {
-constexpr const char* kSegmentStyle =
-    "QPushButton { border: 1px solid palette(mid); background: palette(button);"
-    " color: palette(button-text); padding: 2px; }"
-    "QPushButton:checked { background: palette(highlight); color: palette(highlighted-text); }"
-    "QPushButton#first { border-top-left-radius: 5px; border-bottom-left-radius: 5px; }"
-    "QPushButton#last { border-top-right-radius: 5px; border-bottom-right-radius: 5px; }"
-    "QPushButton:focus { border: 2px solid palette(highlight); }"
-    "QPushButton:focus:checked { border: 2px solid palette(highlighted-text); }";
-
-// A segment takes the focus by Tab or a click; the arrow keys choose its neighbour.
-class SegmentButton : public QPushButton {
-  public:
-    SegmentButton(const QString& title, QWidget* parent, std::function<void(int)> step)
-        : QPushButton(title, parent), step_(std::move(step)) {}
-
-  protected:
-    void keyPressEvent(QKeyEvent* event) override {
-        switch (event->key()) {
-            case Qt::Key_Left:
-            case Qt::Key_Up:
-                step_(-1);
-                break;
-            case Qt::Key_Right:
-            case Qt::Key_Down:
-                step_(1);
-                break;
-            default:
-                QPushButton::keyPressEvent(event);
-        }
-    }
-
-  private:
-    std::function<void(int)> step_;
-};
-}  // namespace
+#include "platform/widgets/segment_widgets.h"
 
 void SegmentedControlItem::SetTitle(const std::string& title) {
     title_ = title;
@@ -85,9 +46,7 @@ long long SegmentedControl::ItemList::Count() const {
 }
 
 SegmentedControl::SegmentedControl() {
-    auto* row = new QWidget;
-    row->setStyleSheet(kSegmentStyle);
-    SetWidget(row);
+    SetWidget(new SegmentRow);
 }
 
 void SegmentedControl::SizeToFit() {
@@ -112,11 +71,9 @@ void SegmentedControl::Rebuild() {
     int x = 0;
     for (size_t i = 0; i < items_.size(); ++i) {
         const int index = static_cast<int>(i);
-        auto* button = new SegmentButton(QString::fromStdString(items_[i]->title_), &row,
+        const SegmentButton::Ends ends{i == 0, i + 1 == items_.size()};
+        auto* button = new SegmentButton(QString::fromStdString(items_[i]->title_), &row, ends,
                                          [this, index](int step) { Step(index + step); });
-        button->setObjectName(i == 0 ? "first" : i + 1 == items_.size() ? "last" : "middle");
-        button->setCheckable(true);
-        button->setFocusPolicy(Qt::StrongFocus);
         button->setGeometry(x, 0, static_cast<int>(items_[i]->width_), Height());
         button->show();
         x += static_cast<int>(items_[i]->width_);

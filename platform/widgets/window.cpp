@@ -14,13 +14,24 @@
 #include "platform/runtime/main_thread.h"
 #include "platform/runtime/qt_color.h"
 #include "platform/runtime/runtime.h"
+#include "platform/widgets/accessible_names.h"
 #include "platform/widgets/focus_order.h"
 #include "platform/widgets/menu.h"
 #include "platform/widgets/native_window.h"
 
 namespace {
 std::vector<std::shared_ptr<Window>> openWindows;
+
+// Whether the control lies on a page of a container, or a tab: it comes and goes with it.
+bool LiesOnPage(const Control& control) {
+    for (auto parent = control.Parent(); parent; parent = parent->Parent()) {
+        if (parent->IsPageContainer()) {
+            return true;
+        }
+    }
+    return false;
 }
+}  // namespace
 
 void NativeWindow::closeEvent(QCloseEvent* event) {
     event->accept();
@@ -176,10 +187,27 @@ QWidget* Window::Native() const {
 }
 
 // While the controls are being built, each page, parent and visibility property would show and
-// hide them all again; the window shows the right ones once, when all are there.
+// hide them all again; the window shows the right ones once, when all are there. A page that
+// comes into view takes the focus at its first control when the focus goes out of view or the
+// window has none yet; focus elsewhere, as on the segments that chose the page, stays.
 void Window::UpdateVisibility() {
     if (!built_) {
         return;
+    }
+    QWidget* focus = native_->focusWidget();
+    const Control* focused = OwnerOf(controls_, focus);
+    const bool focusLeaves = !focus || (focused && !focused->IsShown());
+    std::vector<const Control*> coming;
+    for (const auto& control : controls_) {
+        const QWidget* widget = control->Widget();
+        if (control->IsShown() && (!widget || widget->isHidden()) && LiesOnPage(*control)) {
+            coming.push_back(&control.Get());
+        }
+    }
+    if (focusLeaves && focus) {
+        // Hidden with the focus, a widget would pass it on to the next control in the order:
+        // a screen reader would speak that one on the way.
+        focus->clearFocus();
     }
     for (const auto& control : controls_) {
         if (QWidget* widget = control->Widget()) {
@@ -190,6 +218,10 @@ void Window::UpdateVisibility() {
             widget->setVisible(shown);
         }
     }
+    if (focusLeaves) {
+        FocusFirstOf(controls_, coming);
+    }
+    NameByNeighbours(controls_);
 }
 
 void Window::NativeClosed() {
