@@ -92,18 +92,6 @@ TEST_F(ShellTest, EitherOrderOfOpenAndLateStartupGivesOneWindowOnTheList) {
     EXPECT_EQ(StateOf(Window1()), State::Listing);
 }
 
-TEST_F(ShellTest, TheWindowHasAFixedSizeAndOnlyACloseButton) {
-    auto window = StartUp();
-    QWidget* native = window->Native();
-    EXPECT_EQ(window->Client()->size(), QSize(968, 628));
-    EXPECT_EQ(native->minimumSize(), native->maximumSize());
-    const Qt::WindowFlags flags = native->windowFlags();
-    EXPECT_TRUE(flags & Qt::WindowCloseButtonHint);
-    EXPECT_FALSE(flags & Qt::WindowMinimizeButtonHint);
-    EXPECT_FALSE(flags & Qt::WindowMaximizeButtonHint);
-    EXPECT_FALSE(flags & Qt::WindowFullscreenButtonHint);
-}
-
 struct Transition {
     friend void PrintTo(const Transition& c, std::ostream* os) { *os << c.name; }
     const char* name;
@@ -150,8 +138,8 @@ TEST_F(ShellTest, PagesShowOnlyTheirOwnControls) {
     EXPECT_TRUE(shown(window->Listbox1()) && shown(window->MainTabs()));
     EXPECT_FALSE(shown(window->PushButton1()) || shown(window->TextArea1()));
 
+    window->TabPanel1()->SetValue(1);  // chosen while its page is hidden
     window->PagePanel1()->SetValue(2);
-    window->TabPanel1()->SetValue(1);
     EXPECT_FALSE(shown(window->Listbox1()) || shown(window->TextArea1()));
     EXPECT_TRUE(shown(window->TextArea2()));
 
