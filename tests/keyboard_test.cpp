@@ -1,8 +1,6 @@
 // The real window driven by the keyboard: the list's keys, Tab to the segments, Copy of a row.
 #include <QClipboard>
-#include <QMainWindow>
 #include <QMenu>
-#include <QMenuBar>
 #include <QPushButton>
 
 #include "window_fixture.h"
@@ -10,12 +8,6 @@
 using namespace testsupport;
 
 namespace {
-
-demo::StoredResult Row(int n, const std::string& document, const std::string& readValue = "42") {
-    const std::string id = std::to_string(n);
-    return {id, "2018-11-" + id, document, "B",
-            demo::ReportText(demo::Layout::A, readValue, "EAN 8", 2)};
-}
 
 class KeyboardTest : public WindowTest {
   protected:
@@ -36,7 +28,7 @@ class KeyboardTest : public WindowTest {
 };
 
 TEST_F(KeyboardTest, EndSelectsTheLastRowAndReturnOpensItsReport) {
-    Store({Row(1, "Box.ai"), Row(2, "Jar.ai"), Row(3, "Tin.ai")});
+    Store({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin.ai")});
     auto window = StartFocused();
     Key(Qt::Key_Return);
     EXPECT_EQ(window->PagePanel1()->Value(), 1) << "no row selected, nothing to open";
@@ -49,7 +41,7 @@ TEST_F(KeyboardTest, EndSelectsTheLastRowAndReturnOpensItsReport) {
 }
 
 TEST_F(KeyboardTest, TabLeavesTheListForTheSegmentsWhichSpaceChooses) {
-    Store({Row(1, "Box.ai")});
+    Store({Result("1", "Box.ai")});
     auto window = StartFocused();
     Key(Qt::Key_Tab);
     ASSERT_TRUE(window->MainTabs()->Widget()->isAncestorOf(QApplication::focusWidget()))
@@ -60,10 +52,9 @@ TEST_F(KeyboardTest, TabLeavesTheListForTheSegmentsWhichSpaceChooses) {
 }
 
 TEST_F(KeyboardTest, CopyPutsTheHeadingLineAndTheSelectedRowOnTheClipboard) {
-    Store({Row(1, "Box.ai"), Row(2, "Jar\tlid.ai", "0361")});
+    Store({Result("1", "Box.ai"), Result("2", "Jar\tlid.ai")});
     auto window = StartFocused();
-    auto* copy =
-        static_cast<QMainWindow*>(window->Native())->menuBar()->findChild<QAction*>("EditCopy");
+    auto* copy = InMenuBar<QAction>(window, "EditCopy");
     ASSERT_NE(copy, nullptr);
     auto offered = [copy] {
         emit static_cast<QMenu*>(copy->parent())->aboutToShow();
@@ -79,11 +70,8 @@ TEST_F(KeyboardTest, CopyPutsTheHeadingLineAndTheSelectedRowOnTheClipboard) {
     Key(Qt::Key_End);
     EXPECT_TRUE(offered());
     Key(Qt::Key_C, Qt::ControlModifier);
-    const std::string readValue = window->Listbox1()->Cell(1, 2);
-    ASSERT_NE(readValue.find("0361"), std::string::npos);
-    EXPECT_EQ(
-        QApplication::clipboard()->text().toStdString(),
-        "Date - Time\tDocument\tRead Value\tGrade\n2018-11-2\tJar lid.ai\t" + readValue + "\tB\n");
+    EXPECT_EQ(QApplication::clipboard()->text().toStdString(),
+              "Date - Time\tDocument\tRead Value\tGrade\n2018-11-02\tJar lid.ai\t 2\tA\n");
 }
 
 }  // namespace
