@@ -2,9 +2,7 @@
 // Copy of a row.
 #include <QAbstractScrollArea>
 #include <QClipboard>
-#include <QMainWindow>
 #include <QMenu>
-#include <QMenuBar>
 #include <QPushButton>
 
 #include "contrast.h"
@@ -14,12 +12,6 @@
 using namespace testsupport;
 
 namespace {
-
-demo::StoredResult Row(int n, const std::string& document, const std::string& readValue = "42") {
-    const std::string id = std::to_string(n);
-    return {id, "2018-11-" + id, document, "B",
-            demo::ReportText(demo::Layout::A, readValue, "EAN 8", 2)};
-}
 
 class KeyboardTest : public WindowTest {
   protected:
@@ -40,7 +32,7 @@ class KeyboardTest : public WindowTest {
 };
 
 TEST_F(KeyboardTest, EndSelectsTheLastRowAndReturnOpensItsReport) {
-    Store({Row(1, "Box.ai"), Row(2, "Jar.ai"), Row(3, "Tin.ai")});
+    Store({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin.ai")});
     auto window = StartFocused();
     Key(Qt::Key_Return);
     EXPECT_EQ(window->PagePanel1()->Value(), 1) << "no row selected, nothing to open";
@@ -55,7 +47,7 @@ TEST_F(KeyboardTest, EndSelectsTheLastRowAndReturnOpensItsReport) {
 // The list that gets the focus rings its first row without choosing it; the first Down chooses
 // that row. The ring and the chosen row's text read on their grounds in either appearance.
 TEST_F(KeyboardTest, TheFocusedListRingsItsCurrentRowWhichTheFirstDownChooses) {
-    Store({Row(1, "Box.ai"), Row(2, "Jar.ai"), Row(3, "Tin.ai")});
+    Store({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin.ai")});
     for (auto appearance : {Appearance::Light, Appearance::Dark}) {
         SetAppearanceForTesting(appearance);
         auto window = StartFocused();
@@ -79,7 +71,7 @@ TEST_F(KeyboardTest, TheFocusedListRingsItsCurrentRowWhichTheFirstDownChooses) {
 // A page that comes into view takes the focus at its first control in the keyboard order when
 // the focus would go out of view with the page before; a text pane rings itself while focused.
 TEST_F(KeyboardTest, TheShownPageTakesTheFocusAtItsFirstControl) {
-    Store({Row(1, "Box.ai")});
+    Store({Result("1", "Box.ai")});
     auto window = StartUp();
     QApplication::setActiveWindow(window->Native());
     EXPECT_EQ(QApplication::focusWidget(), &View(window)) << "the list page, at start";
@@ -101,7 +93,7 @@ TEST_F(KeyboardTest, TheShownPageTakesTheFocusAtItsFirstControl) {
 }
 
 TEST_F(KeyboardTest, TabLeavesTheListForTheSegmentsWhichSpaceChooses) {
-    Store({Row(1, "Box.ai")});
+    Store({Result("1", "Box.ai")});
     auto window = StartFocused();
     Key(Qt::Key_Tab);
     ASSERT_TRUE(window->MainTabs()->Widget()->isAncestorOf(QApplication::focusWidget()))
@@ -114,10 +106,9 @@ TEST_F(KeyboardTest, TabLeavesTheListForTheSegmentsWhichSpaceChooses) {
 }
 
 TEST_F(KeyboardTest, CopyPutsTheHeadingLineAndTheSelectedRowOnTheClipboard) {
-    Store({Row(1, "Box.ai"), Row(2, "Jar\tlid.ai", "0361")});
+    Store({Result("1", "Box.ai"), Result("2", "Jar\tlid.ai")});
     auto window = StartFocused();
-    auto* copy =
-        static_cast<QMainWindow*>(window->Native())->menuBar()->findChild<QAction*>("EditCopy");
+    auto* copy = InMenuBar<QAction>(window, "EditCopy");
     ASSERT_NE(copy, nullptr);
     auto offered = [copy] {
         emit static_cast<QMenu*>(copy->parent())->aboutToShow();
@@ -133,11 +124,8 @@ TEST_F(KeyboardTest, CopyPutsTheHeadingLineAndTheSelectedRowOnTheClipboard) {
     Key(Qt::Key_End);
     EXPECT_TRUE(offered());
     Key(Qt::Key_C, Qt::ControlModifier);
-    const std::string readValue = window->Listbox1()->Cell(1, 2);
-    ASSERT_NE(readValue.find("0361"), std::string::npos);
-    EXPECT_EQ(
-        QApplication::clipboard()->text().toStdString(),
-        "Date - Time\tDocument\tRead Value\tGrade\n2018-11-2\tJar lid.ai\t" + readValue + "\tB\n");
+    EXPECT_EQ(QApplication::clipboard()->text().toStdString(),
+              "Date - Time\tDocument\tRead Value\tGrade\n2018-11-02\tJar lid.ai\t 2\tA\n");
 }
 
 }  // namespace

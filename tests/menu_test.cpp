@@ -1,64 +1,31 @@
-// The menu bar: its structure, its native form in the window, its style's icon, and quitting.
-#include <QAction>
-#include <QApplication>
+// The menu bar in its native form in the window: its shortcuts, Copy and Select All, and Quit.
 #include <QClipboard>
-#include <QGuiApplication>
-#include <QMainWindow>
 #include <QMenu>
-#include <QMenuBar>
 #include <QPlainTextEdit>
+#include <QStyle>
 
 #include "platform/runtime/application_style.h"
-#include "platform/runtime/runtime.h"
-#include "shell/main_menu_bar.h"
-#include "shell/startup.h"
-#include "shell/window1.h"
-#include "support.h"
+#include "window_fixture.h"
 
 using namespace testsupport;
 
-namespace {
-class MenuTest : public RootedTest {};
+using MenuTest = WindowTest;
 
-QMenu* NativeMenu(const Ref<class Window1>& window, const char* name) {
-    auto* bar = static_cast<QMainWindow*>(window->Native())->menuBar();
-    return bar->findChild<QMenu*>(name);
-}
-// The menu bar's overflow icon, handed over unread, draws as the desktop style's own; the
-// other icons come from that style unchanged.
-TEST(ApplicationStyleTest, IconsLookAsTheDesktopStylesOwn) {
-    ApplicationStyle style;
-    QStyle* desktop = QApplication::style();
-    for (auto which : {QStyle::SP_ToolBarHorizontalExtensionButton, QStyle::SP_MessageBoxWarning}) {
-        const QIcon icon = style.standardIcon(which);
-        ASSERT_FALSE(icon.isNull()) << which;
-        EXPECT_EQ(icon.pixmap(QSize(16, 16)).toImage(),
-                  desktop->standardIcon(which).pixmap(QSize(16, 16)).toImage())
-            << which;
-    }
-}
-
-}  // namespace
-
-// One bar for every window; its native form keeps the shortcuts users reach for.
+// The native form keeps the shortcuts users reach for.
 TEST_F(MenuTest, TheWindowShowsTheOneBarWithItsShortcuts) {
-    _EarlyStartup();
-    auto window = Window1();
-    EXPECT_EQ(MainMenuBar(), MainMenuBar()) << "built once";
-    EXPECT_TRUE(MainMenuBar()->Child("EditSelectAll").IsNil()) << "Child looks one level down";
-    QMenu* edit = NativeMenu(window, "EditMenu");
+    auto window = StartUp();
+    QMenu* edit = InMenuBar<QMenu>(window, "EditMenu");
     ASSERT_NE(edit, nullptr);
     ASSERT_EQ(edit->actions().size(), 8);
     EXPECT_TRUE(edit->actions()[1]->isSeparator());
     EXPECT_EQ(edit->actions()[3]->shortcut(), QKeySequence(QKeySequence::Copy));
-    QMenu* file = NativeMenu(window, "FileMenu");
+    QMenu* file = InMenuBar<QMenu>(window, "FileMenu");
     ASSERT_NE(file, nullptr);
     EXPECT_EQ(file->actions().at(0)->shortcut(), QKeySequence("Ctrl+Q"));
 }
 
 TEST_F(MenuTest, CopyAndSelectAllWorkOnTheFocusedReportText) {
-    _EarlyStartup();
-    auto window = Window1();
+    auto window = StartUp();
     window->PagePanel1()->SetValue(2);
     window->TextArea1()->SetText("    Bar 1 330\rBar 2 660");
     window->Native()->activateWindow();
@@ -73,12 +40,25 @@ TEST_F(MenuTest, CopyAndSelectAllWorkOnTheFocusedReportText) {
 }
 
 TEST_F(MenuTest, QuitEndsTheEventLoopAndClosesTheWindow) {
-    _EarlyStartup();
-    auto window = Window1();
-    QMenu* file = NativeMenu(window, "FileMenu");
+    auto window = StartUp();
+    QMenu* file = InMenuBar<QMenu>(window, "FileMenu");
     QTimer::singleShot(0, [file] { file->actions().at(0)->trigger(); });
     QTimer::singleShot(5000, [] { QCoreApplication::exit(1); });
     EXPECT_EQ(QCoreApplication::exec(), 0);
     EXPECT_FALSE(window->IsOpen());
     EXPECT_TRUE(_GetImplicitWindow("Window1.Window1").IsNil());
+}
+
+// The menu bar's overflow icon, handed over unread, draws as the desktop style's own; the
+// other icons come from that style unchanged.
+TEST(ApplicationStyleTest, IconsLookAsTheDesktopStylesOwn) {
+    ApplicationStyle style;
+    QStyle* desktop = QApplication::style();
+    for (auto which : {QStyle::SP_ToolBarHorizontalExtensionButton, QStyle::SP_MessageBoxWarning}) {
+        const QIcon icon = style.standardIcon(which);
+        ASSERT_FALSE(icon.isNull()) << which;
+        EXPECT_EQ(icon.pixmap(QSize(16, 16)).toImage(),
+                  desktop->standardIcon(which).pixmap(QSize(16, 16)).toImage())
+            << which;
+    }
 }

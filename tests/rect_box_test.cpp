@@ -13,13 +13,15 @@
 
 namespace {
 
-constexpr int W = 200;
-constexpr int H = 120;
 constexpr Color kColour = 0x225684;
 const QRgb kGround = qRgb(255, 255, 255);
+const QRgb kSolid = qRgb(Red(kColour), Green(kColour), Blue(kColour));
+// Black at a quarter strength over the frame's colour.
+const QRgb kHairline =
+    qRgb(qRound(qRed(kSolid) * 191 / 255.0), qRound(qGreen(kSolid) * 191 / 255.0),
+         qRound(qBlue(kSolid) * 191 / 255.0));
 
-QImage Paint(long long linesize, const std::string& title, int width = W, int height = H,
-             int ratio = 1) {
+QImage Paint(long long linesize, const std::string& title, int width, int height, int ratio = 1) {
     QImage image(width * ratio, height * ratio, QImage::Format_ARGB32);
     image.setDevicePixelRatio(ratio);
     image.fill(kGround);
@@ -32,81 +34,74 @@ QImage Paint(long long linesize, const std::string& title, int width = W, int he
     return image;
 }
 
-QRgb Solid() {
-    return qRgb(Red(kColour), Green(kColour), Blue(kColour));
+// A point in the frame's own pixels and the colour it must have; the ground exactly, the
+// frame's colours give or take the rounding of a blend.
+struct Probe {
+    int x, y;
+    QRgb colour;
+};
+
+struct Frame {
+    long long linesize;
+    std::string title;
+    int width, height, ratio;
+    std::vector<Probe> probes;
+};
+
+// Three thick, titled. Left side below the band: outer hairline, frame, inner hairline, ground;
+// then the right inner hairline. The bottom ends at H - L, the last L rows unpainted. The band:
+// hairline on its top row and right side, solid right of the title, the line on row 19 from
+// L - 1, the ground below.
+const std::vector<Probe> kTitled = {
+    {0, 60, kHairline},   {1, 60, kSolid},       {2, 60, kHairline},   {3, 60, kGround},
+    {197, 60, kHairline}, {100, 116, kHairline}, {100, 115, kSolid},   {100, 114, kHairline},
+    {100, 117, kGround},  {100, 0, kHairline},   {199, 10, kHairline}, {150, 10, kSolid},
+    {100, 19, kHairline}, {1, 19, kSolid},       {100, 21, kGround}};
+// Untitled: four rounded corners and no band.
+const std::vector<Probe> kUntitled = {
+    {0, 0, kGround}, {199, 0, kGround}, {100, 1, kSolid}, {100, 10, kGround}};
+// Two thick: no hairlines, a flat band, the bottom frame ends at H - L.
+const std::vector<Probe> kThin = {
+    {0, 60, kSolid}, {2, 60, kGround}, {100, 19, kSolid}, {100, 117, kSolid}, {100, 118, kGround}};
+// As tall as a page: its sides halfway down, a rounded corner.
+const std::vector<Probe> kPageSized = {{1, 300, kSolid}, {895, 300, kSolid}, {0, 516, kGround}};
+
+const Frame kFrames[] = {
+    {3, "Verification Results", 200, 120, 1, kTitled},
+    {3, "", 200, 120, 1, kUntitled},
+    {2, "   ", 200, 120, 1, kThin},
+    {3, "Verification Results", 897, 520, 1, kPageSized},
+    {3, "Verification Results", 897, 520, 2, kPageSized},  // two pixels a point
+};
+
+TEST(RectBox, EachFramePaintsItsArithmetic) {
+    const auto near = [](QRgb a, QRgb b) {
+        return std::abs(qRed(a) - qRed(b)) <= 2 && std::abs(qGreen(a) - qGreen(b)) <= 2 &&
+               std::abs(qBlue(a) - qBlue(b)) <= 2;
+    };
+    for (const Frame& f : kFrames) {
+        const QImage image = Paint(f.linesize, f.title, f.width, f.height, f.ratio);
+        for (const Probe& p : f.probes) {
+            const QRgb actual = image.pixel(p.x * f.ratio, p.y * f.ratio);
+            EXPECT_TRUE(p.colour == kGround ? actual == kGround : near(actual, p.colour))
+                << "frame " << &f - kFrames << " at " << p.x << ", " << p.y << ": " << std::hex
+                << actual << " for " << p.colour;
+        }
+    }
 }
 
-// Black at a quarter strength over the frame's colour.
-QRgb Hairline(QRgb under) {
-    auto dim = [](int c) { return static_cast<int>(c * 191 / 255.0 + 0.5); };
-    return qRgb(dim(qRed(under)), dim(qGreen(under)), dim(qBlue(under)));
-}
-
-void ExpectNear(QRgb actual, QRgb expected, const char* where) {
-    EXPECT_LE(std::abs(qRed(actual) - qRed(expected)), 2) << where;
-    EXPECT_LE(std::abs(qGreen(actual) - qGreen(expected)), 2) << where;
-    EXPECT_LE(std::abs(qBlue(actual) - qBlue(expected)), 2) << where;
-}
-
-TEST(RectBox, FrameOfThreeWithTitle) {
-    const QImage image = Paint(3, "Verification Results");
-    const int mid = W / 2;
-    const int y = 60;
-    // Left side below the band: outer hairline, frame, inner hairline, then the ground.
-    ExpectNear(image.pixel(0, y), Hairline(Solid()), "outer hairline");
-    ExpectNear(image.pixel(1, y), Solid(), "frame");
-    ExpectNear(image.pixel(2, y), Hairline(Solid()), "inner hairline");
-    EXPECT_EQ(image.pixel(3, y), kGround);
-    ExpectNear(image.pixel(W - 3, y), Hairline(Solid()), "right inner hairline");
-    // Bottom: the frame ends at H - L; the last L rows stay unpainted.
-    ExpectNear(image.pixel(mid, H - 4), Hairline(Solid()), "bottom outer hairline");
-    ExpectNear(image.pixel(mid, H - 5), Solid(), "bottom frame");
-    ExpectNear(image.pixel(mid, H - 6), Hairline(Solid()), "bottom inner hairline");
-    EXPECT_EQ(image.pixel(mid, H - 3), kGround);
-    // The band: hairline on its top row, solid inside, and the line on row 19.
-    ExpectNear(image.pixel(mid, 0), Hairline(Solid()), "band top hairline");
-    ExpectNear(image.pixel(W - 1, 10), Hairline(Solid()), "band right hairline");
-    ExpectNear(image.pixel(150, 10), Solid(), "band right of the title");
-    ExpectNear(image.pixel(mid, 19), Hairline(Solid()), "row 19 line");
-    ExpectNear(image.pixel(1, 19), Solid(), "row 19 starts at L - 1");
-    EXPECT_EQ(image.pixel(mid, 21), kGround);
-    // The title: white pixels between x = 16 and the band's bottom.
+// The title in white between x = 16 and the band's bottom, and nothing white before x = 16.
+TEST(RectBox, TheTitleIsWhiteFromSixteenOn) {
+    const QImage image = Paint(3, "Verification Results", 200, 120);
     bool white = false;
     for (int x = 16; x < 120 && !white; ++x) {
-        for (int yy = 3; yy <= 16 && !white; ++yy) {
-            white = qRed(image.pixel(x, yy)) > 240 && qGreen(image.pixel(x, yy)) > 240;
+        for (int y = 3; y <= 16 && !white; ++y) {
+            white = qRed(image.pixel(x, y)) > 240 && qGreen(image.pixel(x, y)) > 240;
         }
     }
     EXPECT_TRUE(white);
-    for (int yy = 0; yy < 20; ++yy) {
-        EXPECT_LT(qRed(image.pixel(10, yy)), 200) << "nothing white before x = 16, row " << yy;
-    }
-}
-
-TEST(RectBox, FrameOfThreeWithoutTitleKeepsFourRoundedCorners) {
-    const QImage image = Paint(3, "");
-    EXPECT_EQ(image.pixel(0, 0), kGround) << "rounded top-left corner";
-    EXPECT_EQ(image.pixel(W - 1, 0), kGround);
-    ExpectNear(image.pixel(W / 2, 1), Solid(), "top frame");
-    EXPECT_EQ(image.pixel(W / 2, 10), kGround) << "no band";
-}
-
-TEST(RectBox, FrameOfTwoHasNoHairlinesAndAFlatBand) {
-    const QImage image = Paint(2, "   ");
-    ExpectNear(image.pixel(0, 60), Solid(), "frame");
-    EXPECT_EQ(image.pixel(2, 60), kGround);
-    ExpectNear(image.pixel(W / 2, 19), Solid(), "band bottom");
-    ExpectNear(image.pixel(W / 2, H - 3), Solid(), "bottom frame ends at H - L");
-    EXPECT_EQ(image.pixel(W / 2, H - 2), kGround);
-}
-
-// A frame as tall as a page, at one and two pixels a point.
-TEST(RectBox, PageSizedFrameHasItsSidesAndRoundedCorners) {
-    for (const int ratio : {1, 2}) {
-        const QImage image = Paint(3, "Verification Results", 897, 520, ratio);
-        ExpectNear(image.pixel(1 * ratio, 300 * ratio), Solid(), "left side, halfway down");
-        ExpectNear(image.pixel(895 * ratio, 300 * ratio), Solid(), "right side, halfway down");
-        EXPECT_EQ(image.pixel(0, 516 * ratio), kGround) << "rounded bottom corner";
+    for (int y = 0; y < 20; ++y) {
+        EXPECT_LT(qRed(image.pixel(10, y)), 200) << "row " << y;
     }
 }
 

@@ -78,24 +78,24 @@ TEST(Text, TrimTakesWhiteSpaceOffBothEndsOnly) {
     EXPECT_EQ(Trim(" \r\n\t "), "");
 }
 
+// No words such as "inf" or "nan", only digits; beyond the range of a double the value is what a
+// double makes of the text.
 TEST(Text, ValReadsTheLeadingNumber) {
-    EXPECT_EQ(Val("022.5"), 22.5);
-    EXPECT_EQ(Val("-3"), -3.0);
-    EXPECT_EQ(Val("Settings"), 0.0);
-    EXPECT_EQ(Val("12abc"), 12.0);
-    EXPECT_EQ(Val("1e3"), 1000.0);
-    EXPECT_EQ(Val("1e"), 1.0);
-    EXPECT_EQ(Val("inf") + Val("nan") + Val("."), 0.0) << "no words, only digits";
-    // Beyond the range of a double the value is what a double makes of the text.
     const double infinity = std::numeric_limits<double>::infinity();
-    EXPECT_EQ(Val("1e999"), infinity);
-    EXPECT_EQ(Val("4e-320"), 4e-320) << "a subnormal value";
-    EXPECT_EQ(Int64FromDouble(Val("1e999")), std::numeric_limits<long long>::max());
+    const std::pair<const char*, double> cases[] = {
+        {"022.5", 22.5}, {"-3", -3.0},        {"Settings", 0.0}, {"12abc", 12.0},
+        {"1e3", 1000.0}, {"1e", 1.0},         {"inf", 0.0},      {"nan", 0.0},
+        {".", 0.0},      {"1e999", infinity}, {"4e-320", 4e-320}};
+    for (const auto& [text, value] : cases) {
+        EXPECT_EQ(Val(text), value) << text;
+    }
 }
 
 TEST(Text, Int64FromDoubleCutsTowardsZeroAndSaturates) {
     EXPECT_EQ(Int64FromDouble(-22.9), -22);
     EXPECT_EQ(Int64FromDouble(-1e300), std::numeric_limits<long long>::min());
+    EXPECT_EQ(Int64FromDouble(std::numeric_limits<double>::infinity()),
+              std::numeric_limits<long long>::max());
     EXPECT_EQ(Int64FromDouble(std::numeric_limits<double>::quiet_NaN()), 0);
 }
 

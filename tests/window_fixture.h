@@ -2,13 +2,15 @@
 #pragma once
 
 #include <QImage>
+#include <QMainWindow>
+#include <QMenuBar>
 #include <QTableView>
 #include <QTest>
 
+#include "demo/demo_tree.h"
 #include "shell/startup.h"
 #include "shell/window1.h"
 #include "support.h"
-#include "demo/demo_tree.h"
 
 namespace testsupport {
 
@@ -31,6 +33,11 @@ class WindowTest : public RootedTest {
                const std::string& schema = demo::kSchema) {
         std::filesystem::remove(demo::StorePath(tree.Path()));
         demo::WriteStore(demo::StorePath(tree.Path()), rows, schema);
+    }
+    // A menu or an item of the window's native menu bar, by name.
+    template <class T>
+    static T* InMenuBar(const Ref<class Window1>& window, const char* name) {
+        return static_cast<QMainWindow*>(window->Native())->menuBar()->findChild<T*>(name);
     }
     QTableView& View(const Ref<class Window1>& window) {
         return *static_cast<QTableView*>(window->Listbox1()->Widget());
