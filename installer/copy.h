@@ -5,5 +5,6 @@
 
 // Copies `source`, a file or a whole folder tree, into the folder `destination` under its own
 // name. The folder is created first and filled afterwards; nothing is checked and nothing
-// caught, so an exception at any depth leaves the items copied so far in place.
+// caught, so an exception at any depth leaves the items copied so far in place. A folder that
+// can't be listed, the source or one below it, raises IOException once its copy is created.
 void CopyFileOrFolder(Ref<FolderItem> source, Ref<FolderItem> destination);

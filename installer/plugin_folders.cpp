@@ -29,6 +29,9 @@ long long NumberOf(const std::string& name) {
 
 }  // namespace
 
+// An "Adobe" or numbered folder that can't be listed raises IOException at Count, which ends
+// the press in "Unable to install at this time 1" rather than at a stop: the folder may well
+// hold Illustrator, so "Could not find Illustrator plugins folder." would mislead.
 Ref<FolderItem> IllustratorPluginsFolder(const Ref<FolderItem>& applicationData) {
     Ref<FolderItem> current = applicationData->Child("Adobe");
     if (!IsFolder(current)) {

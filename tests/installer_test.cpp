@@ -2,6 +2,8 @@
 // message that was shown and the files that stand afterwards.
 #include <unistd.h>
 
+#include <cstdio>
+
 #include <QAbstractItemView>
 #include <QComboBox>
 
@@ -204,6 +206,59 @@ INSTANTIATE_TEST_SUITE_P(
                     WriteFile(b, "plug-in");
                 },
                 kNoAccess, "Plug-ins", nullptr}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+// A folder that the user may not list, in the bundle, as the bundle or on the Illustrator walk:
+// never "Installed", and what was copied before it stays. Root lists any folder, so the press
+// runs in a child process as nobody.
+struct Unlistable {
+    const char* name;
+    Row row;
+    std::string folder;  // made unlistable, below application data or the resources
+    std::string kept;    // below application data: copied before the folder was met, if any
+};
+
+class UnlistableTest : public InstallerTest, public ::testing::WithParamInterface<Unlistable> {};
+
+TEST_P(UnlistableTest, EndsInTheCatchAllMessage) {
+    const fs::path plugins[] = {Illustrator("24") / "en_US/Plug-ins",
+                                Data() / "Adobe/Acrobat/DC/Plug-ins"};
+    for (const fs::path& folder : plugins) {
+        fs::create_directories(folder);
+        fs::permissions(folder, fs::perms::all);
+    }
+    const std::string& folder = GetParam().folder;
+    const fs::path unlistable = folder.starts_with("Adobe") ? Data() / folder : resources / folder;
+    fs::permissions(tree.Path(), fs::perms::owner_all | fs::perms::others_exec);
+    fs::permissions(unlistable, fs::perms::none);
+    StartUp();
+    EXPECT_EXIT(
+        {
+            if (geteuid() == 0 && (setgid(65534) != 0 || setuid(65534) != 0)) {
+                std::_Exit(3);
+            }
+            const std::string message = Press(GetParam().row);
+            std::fprintf(stderr, "%s\n", message.c_str());
+            std::_Exit(message == kCatchAll ? 0 : 1);
+        },
+        ::testing::ExitedWithCode(0), "");
+    fs::permissions(unlistable, fs::perms::owner_all);
+    if (GetParam().kept.empty()) {
+        EXPECT_TRUE(fs::is_empty(plugins[0]) && fs::is_empty(plugins[1]));
+    } else {
+        EXPECT_TRUE(fs::exists(Data() / GetParam().kept));
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Folders, UnlistableTest,
+    ::testing::Values(
+        Unlistable{"ASubFolderOfTheBundle", kAcrobatDC, "Ostrelin.acroplugin/Contents/Resources",
+                   "Adobe/Acrobat/DC/" + kCopied + "MacOS/binary"},
+        Unlistable{"TheBundle", kIllustrator, "Quilbrant.aip",
+                   "Adobe/Adobe Illustrator 24/en_US/Plug-ins/Quilbrant.aip"},
+        Unlistable{"TheAdobeFolder", kIllustrator, "Adobe", ""},
+        Unlistable{"TheNumberedFolder", kIllustrator, "Adobe/Adobe Illustrator 24", ""}),
     [](const auto& info) { return std::string(info.param.name); });
 
 // Return and Enter on the installation page press "Install Now" wherever the focus is; in the

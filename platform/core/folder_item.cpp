@@ -1,5 +1,6 @@
 // FolderItem over std::filesystem. Every operation uses the error-code forms: a failure of
-// the file system never raises here, it shows in Exists, Directory and Count.
+// the file system shows in Exists, Directory and Count, and raises only where a folder that
+// stands can't be listed.
 #include "platform/core/folder_item.h"
 
 #include <algorithm>
@@ -117,8 +118,17 @@ const std::vector<std::string>& FolderItem::Children() const {
         return children_;
     }
     children_.clear();
-    for (fs::directory_iterator it(path_, error), end; !error && it != end; it.increment(error)) {
+    childrenRead_ = false;
+    fs::directory_iterator it(path_, error);
+    if (error == std::errc::not_a_directory) {
+        return children_;  // a file has no children
+    }
+    for (const fs::directory_iterator end; !error && it != end; it.increment(error)) {
         children_.push_back(it->path().filename().string());
+    }
+    if (error) {
+        children_.clear();
+        throw IOException("Can't list the folder (" + error.message() + "): " + path_.string());
     }
     std::sort(children_.begin(), children_.end());
     childrenStamp_ = stamp;

@@ -18,6 +18,8 @@ class FolderItem {
     Ref<FolderItem> Child(const std::string& name) const;
     // Child number `index` from 1 to Count, in the order of their names; Nil outside.
     Ref<FolderItem> Item(long long index) const;
+    // 0 where nothing or a file stands. A folder that can't be listed raises IOException, here
+    // and in Item: taken for empty, it would be copied as an empty folder that passes for whole.
     long long Count() const;
     std::string Name() const;
     bool Exists() const;
