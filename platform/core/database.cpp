@@ -19,13 +19,11 @@ constinit const Ref<DatabaseField> kNil;
 bool IsBlankTail(sqlite3* db, const char* tail) {
     // Only blanks and comments may follow: a second statement makes the text fail.
     while (tail && *tail) {
-        sqlite3_stmt* next = nullptr;
+        sqlite3_stmt* prepared = nullptr;
         const char* rest = nullptr;
-        if (sqlite3_prepare_v2(db, tail, -1, &next, &rest) != SQLITE_OK) {
-            return false;
-        }
-        if (next) {
-            sqlite3_finalize(next);
+        const int result = sqlite3_prepare_v2(db, tail, -1, &prepared, &rest);
+        const StatementPtr next(prepared);
+        if (result != SQLITE_OK || next) {
             return false;
         }
         if (rest == tail) {
@@ -68,6 +66,14 @@ bool IsWalWithoutLog(const std::filesystem::path& file) {
 
 }  // namespace
 
+void FinalizeStatement::operator()(sqlite3_stmt* statement) const {
+    sqlite3_finalize(statement);
+}
+
+void CloseConnection::operator()(sqlite3* connection) const {
+    sqlite3_close_v2(connection);
+}
+
 void DatabaseField::Refer(const char* text, size_t bytes) {
     if (!kept_.empty()) {
         kept_ = std::string();  // a huge text kept before goes back to the system
@@ -82,11 +88,11 @@ void DatabaseField::Keep() {
     }
 }
 
-RecordSet::RecordSet(std::shared_ptr<sqlite3> connection, sqlite3_stmt* statement, bool atEnd)
-    : connection_(std::move(connection)), statement_(statement), atEnd_(atEnd) {
-    const int count = sqlite3_column_count(statement_);
+RecordSet::RecordSet(StatementPtr statement, bool atEnd)
+    : statement_(std::move(statement)), atEnd_(atEnd) {
+    const int count = sqlite3_column_count(statement_.get());
     for (int i = 0; i < count; ++i) {
-        const char* name = sqlite3_column_name(statement_, i);
+        const char* name = sqlite3_column_name(statement_.get(), i);
         columns_.emplace_back(name ? name : "");
     }
     fields_.resize(columns_.size());
@@ -128,7 +134,7 @@ const Ref<DatabaseField>& RecordSet::Field(std::string_view name) const {
     // The column's value is asked for once, rather than once for its text and once for its
     // length. SQLite hands it out unprotected, which only matters to another thread, and the
     // connection is this thread's alone.
-    sqlite3_value* value = sqlite3_column_value(statement_, column);
+    sqlite3_value* value = sqlite3_column_value(statement_.get(), column);
     const auto* text = reinterpret_cast<const char*>(sqlite3_value_text(value));
     const auto bytes = text ? static_cast<size_t>(sqlite3_value_bytes(value)) : 0;
     Ref<DatabaseField>& field = fields_[static_cast<size_t>(column)];
@@ -146,7 +152,7 @@ const Ref<DatabaseField>& RecordSet::Field(std::string_view name) const {
 void RecordSet::MoveNext() {
     if (statement_ && !atEnd_) {
         KeepHeldFields();
-        atEnd_ = sqlite3_step(statement_) != SQLITE_ROW;
+        atEnd_ = sqlite3_step(statement_.get()) != SQLITE_ROW;
     }
 }
 
@@ -160,13 +166,9 @@ void RecordSet::KeepHeldFields() {
 
 void RecordSet::Close() {
     KeepHeldFields();
-    if (statement_) {
-        sqlite3_finalize(statement_);
-        statement_ = nullptr;
-    }
+    statement_.reset();
     fields_.clear();
     atEnd_ = true;
-    connection_.reset();
 }
 
 bool SQLiteDatabase::Connect() {
@@ -192,7 +194,7 @@ bool SQLiteDatabase::Connect() {
     // call would be pure cost.
     const int opened = sqlite3_open_v2(
         uri.c_str(), &db, SQLITE_OPEN_READONLY | SQLITE_OPEN_URI | SQLITE_OPEN_NOMUTEX, nullptr);
-    std::shared_ptr<sqlite3> connection(db, sqlite3_close_v2);
+    ConnectionPtr connection(db);
     if (opened != SQLITE_OK) {
         return false;
     }
@@ -212,22 +214,21 @@ Ref<RecordSet> SQLiteDatabase::SQLSelect(const std::string& statement) {
     }
     sqlite3_stmt* prepared = nullptr;
     const char* tail = nullptr;
-    if (sqlite3_prepare_v2(connection_.get(), statement.c_str(), static_cast<int>(statement.size()),
-                           &prepared, &tail) != SQLITE_OK ||
-        !prepared) {
+    const int result = sqlite3_prepare_v2(connection_.get(), statement.c_str(),
+                                          static_cast<int>(statement.size()), &prepared, &tail);
+    StatementPtr owned(prepared);
+    if (result != SQLITE_OK || !owned) {
         return nullptr;
     }
     const std::string rest(tail, statement.c_str() + statement.size() - tail);
     if (!IsBlankTail(connection_.get(), rest.c_str())) {
-        sqlite3_finalize(prepared);
         return nullptr;
     }
-    const int first = sqlite3_step(prepared);
+    const int first = sqlite3_step(owned.get());
     if (first != SQLITE_ROW && first != SQLITE_DONE) {
-        sqlite3_finalize(prepared);
         return nullptr;
     }
-    return New<RecordSet>(connection_, prepared, first == SQLITE_DONE);
+    return New<RecordSet>(std::move(owned), first == SQLITE_DONE);
 }
 
 void SQLiteDatabase::Close() {

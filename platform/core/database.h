@@ -36,9 +36,20 @@ class DatabaseField {
     std::string_view value_;
 };
 
+// The SQLite objects, each released by its own call when its owner goes.
+struct FinalizeStatement {
+    void operator()(sqlite3_stmt* statement) const;
+};
+using StatementPtr = std::unique_ptr<sqlite3_stmt, FinalizeStatement>;
+// A connection closed while statements are left stays open for them until they go.
+struct CloseConnection {
+    void operator()(sqlite3* connection) const;
+};
+using ConnectionPtr = std::unique_ptr<sqlite3, CloseConnection>;
+
 class RecordSet {
   public:
-    RecordSet(std::shared_ptr<sqlite3> connection, sqlite3_stmt* statement, bool atEnd);
+    RecordSet(StatementPtr statement, bool atEnd);
     ~RecordSet();
     RecordSet(const RecordSet&) = delete;
     RecordSet& operator=(const RecordSet&) = delete;
@@ -55,8 +66,7 @@ class RecordSet {
   private:
     void KeepHeldFields();
 
-    std::shared_ptr<sqlite3> connection_;
-    sqlite3_stmt* statement_;
+    StatementPtr statement_;
     bool atEnd_;
     std::vector<std::string> columns_;
     // Names asked before, exactly as asked, with their column: a loop asks the same few.
@@ -82,5 +92,5 @@ class SQLiteDatabase {
     static constexpr int kBusyMilliseconds = 2000;
 
   private:
-    std::shared_ptr<sqlite3> connection_;
+    ConnectionPtr connection_;
 };
