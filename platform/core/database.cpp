@@ -3,6 +3,7 @@
 
 #include <sqlite3.h>
 
+#include <algorithm>
 #include <filesystem>
 #include <fstream>
 #include <string_view>
@@ -11,10 +12,6 @@
 #include "platform/core/text.h"
 
 namespace {
-
-// What Field hands out for no such column, or no current row: a reference to it stays valid
-// until the program ends.
-constinit const Ref<DatabaseField> kNil;
 
 bool IsBlankTail(sqlite3* db, const char* tail) {
     // Only blanks and comments may follow: a second statement makes the text fail.
@@ -64,6 +61,14 @@ bool IsWalWithoutLog(const std::filesystem::path& file) {
            !std::filesystem::exists(file.string() + "-wal", error);
 }
 
+// A field that someone else still holds keeps its own copy of the text, and leaves the pool.
+void LetGoIfHeld(Ref<DatabaseField>& field) {
+    if (field && field.Shared().use_count() > 1) {
+        field->Keep();
+        field = nullptr;
+    }
+}
+
 }  // namespace
 
 void FinalizeStatement::operator()(sqlite3_stmt* statement) const {
@@ -72,20 +77,6 @@ void FinalizeStatement::operator()(sqlite3_stmt* statement) const {
 
 void CloseConnection::operator()(sqlite3* connection) const {
     sqlite3_close_v2(connection);
-}
-
-void DatabaseField::Refer(const char* text, size_t bytes) {
-    if (!kept_.empty()) {
-        kept_ = std::string();  // a huge text kept before goes back to the system
-    }
-    value_ = std::string_view(text, bytes);
-}
-
-void DatabaseField::Keep() {
-    if (value_.data() != kept_.data()) {
-        kept_.assign(value_);
-        value_ = kept_;
-    }
 }
 
 RecordSet::RecordSet(StatementPtr statement, bool atEnd)
@@ -102,70 +93,43 @@ RecordSet::~RecordSet() {
     Close();
 }
 
-const Ref<DatabaseField>& RecordSet::Field(std::string_view name) const {
+Ref<DatabaseField> RecordSet::Field(std::string_view name) const {
     if (!statement_ || atEnd_) {
-        return kNil;
+        return nullptr;
     }
-    int column = -1;
-    // A loop asks the same names in the same order: the one behind the last is tried first.
-    if (nextAsked_ < asked_.size() && asked_[nextAsked_].first == name) {
-        column = asked_[nextAsked_].second;
-    } else {
-        nextAsked_ = 0;
-        for (; nextAsked_ < asked_.size(); ++nextAsked_) {
-            if (asked_[nextAsked_].first == name) {
-                column = asked_[nextAsked_].second;
-                break;
-            }
+    for (size_t column = 0; column < columns_.size(); ++column) {
+        if (TextEquals(columns_[column], name)) {
+            return FieldAt(column);
         }
     }
-    ++nextAsked_;
-    if (column < 0) {
-        for (size_t i = 0; i < columns_.size() && column < 0; ++i) {
-            if (TextEquals(columns_[i], name)) {
-                column = static_cast<int>(i);
-            }
-        }
-        if (column < 0) {
-            return kNil;
-        }
-        asked_.emplace_back(name, column);
-    }
-    // The column's value is asked for once, rather than once for its text and once for its
-    // length. SQLite hands it out unprotected, which only matters to another thread, and the
-    // connection is this thread's alone.
-    sqlite3_value* value = sqlite3_column_value(statement_.get(), column);
+    return nullptr;
+}
+
+// SQLite hands out the column's value unprotected, which only matters to another thread, and
+// the connection is this thread's alone.
+Ref<DatabaseField> RecordSet::FieldAt(size_t column) const {
+    sqlite3_value* value = sqlite3_column_value(statement_.get(), static_cast<int>(column));
     const auto* text = reinterpret_cast<const char*>(sqlite3_value_text(value));
-    const auto bytes = text ? static_cast<size_t>(sqlite3_value_bytes(value)) : 0;
-    Ref<DatabaseField>& field = fields_[static_cast<size_t>(column)];
-    if (!field || field.Shared().use_count() > 1) {
-        if (field) {
-            field->Keep();  // it stays with its holder
-        }
+    const auto bytes = static_cast<size_t>(sqlite3_value_bytes(value));
+    Ref<DatabaseField>& field = fields_[column];
+    LetGoIfHeld(field);
+    if (!field) {
         field = New<DatabaseField>();
     }
-    field->Refer(text ? text : "", bytes);
+    field->Show(text ? std::string_view(text, bytes) : std::string_view());
     return field;
 }
 
 // A failure while stepping ends the rows, as the end of the result would.
 void RecordSet::MoveNext() {
     if (statement_ && !atEnd_) {
-        KeepHeldFields();
+        std::for_each(fields_.begin(), fields_.end(), LetGoIfHeld);
         atEnd_ = sqlite3_step(statement_.get()) != SQLITE_ROW;
     }
 }
 
-void RecordSet::KeepHeldFields() {
-    for (const auto& field : fields_) {
-        if (field && field.Shared().use_count() > 1) {
-            field->Keep();
-        }
-    }
-}
-
 void RecordSet::Close() {
-    KeepHeldFields();
+    std::for_each(fields_.begin(), fields_.end(), LetGoIfHeld);
     statement_.reset();
     fields_.clear();
     atEnd_ = true;
