@@ -97,8 +97,14 @@ Ref<DatabaseField> RecordSet::Field(std::string_view name) const {
     if (!statement_ || atEnd_) {
         return nullptr;
     }
+    for (const auto& [asked, column] : found_) {
+        if (asked == name) {
+            return FieldAt(column);
+        }
+    }
     for (size_t column = 0; column < columns_.size(); ++column) {
         if (TextEquals(columns_[column], name)) {
+            found_.emplace_back(name, column);
             return FieldAt(column);
         }
     }
