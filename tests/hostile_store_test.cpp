@@ -20,6 +20,9 @@ struct HostileStore {
     void (*make)(const fs::path& store);
     std::vector<std::string> documents;  // what the list shows afterwards
 };
+void PrintTo(const HostileStore& store, std::ostream* out) {
+    *out << store.name;
+}
 
 class HostileStoreTest : public WindowTest, public ::testing::WithParamInterface<HostileStore> {};
 

@@ -56,6 +56,9 @@ struct RandomCase {
     unsigned seed;
     bool inOrder;
 };
+void PrintTo(const RandomCase& c, std::ostream* out) {
+    *out << (c.inOrder ? "in order, seed " : "any order, seed ") << c.seed;
+}
 
 class RowStoreRandomTest : public ::testing::TestWithParam<RandomCase> {};
 
