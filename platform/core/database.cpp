@@ -4,10 +4,11 @@
 #include <sqlite3.h>
 
 #include <algorithm>
+#include <chrono>
 #include <filesystem>
-#include <fstream>
 #include <string_view>
 #include <system_error>
+#include <thread>
 
 #include "platform/core/text.h"
 
@@ -47,18 +48,50 @@ std::string UriPath(const std::string& path) {
     return out;
 }
 
-// A database file in WAL mode (versions 2 in its header) with no -wal file beside it: the
-// last writer has closed it, and everything stands in the file itself.
-bool IsWalWithoutLog(const std::filesystem::path& file) {
-    char header[20] = {};
-    std::ifstream in(file, std::ios::binary);
-    if (!in.read(header, sizeof header) ||
-        std::string_view(header, 16) != std::string_view("SQLite format 3\0", 16)) {
-        return false;
+using Clock = std::chrono::steady_clock;
+
+constexpr auto kLockWait = std::chrono::milliseconds(SQLiteDatabase::kBusyMilliseconds);
+constexpr auto kLockPause = std::chrono::milliseconds(10);
+constexpr int kProgressInstructions = 1000;
+
+void (*waitHook)() = nullptr;
+std::chrono::milliseconds quietLimit = std::chrono::seconds(30);
+// When the current call into SQLite began. Reads run on one thread, one call at a time.
+Clock::time_point workBegan;
+
+// A lock that another connection holds is waited for, kLockWait at most, with the hook called
+// between two tries.
+int OnBusy(void*, int tries) {
+    static Clock::time_point waitBegan;
+    const auto now = Clock::now();
+    if (tries == 0) {
+        waitBegan = now;
     }
-    std::error_code error;
-    return (header[18] == 2 || header[19] == 2) &&
-           !std::filesystem::exists(file.string() + "-wal", error);
+    if (now - waitBegan >= kLockWait) {
+        return 0;
+    }
+    if (waitHook) {
+        waitHook();
+    }
+    std::this_thread::sleep_for(kLockPause);
+    return 1;
+}
+
+// Called every kProgressInstructions steps of SQLite's machine: a call that has given no row for
+// the quiet limit is interrupted, and fails as any other failed call does.
+int OnProgress(void*) {
+    if (Clock::now() - workBegan > quietLimit) {
+        return 1;
+    }
+    if (waitHook) {
+        waitHook();
+    }
+    return 0;
+}
+
+int Step(sqlite3_stmt* statement) {
+    workBegan = Clock::now();
+    return sqlite3_step(statement);
 }
 
 // A field that someone else still holds keeps its own copy of the text, and leaves the pool.
@@ -130,7 +163,7 @@ Ref<DatabaseField> RecordSet::FieldAt(size_t column) const {
 void RecordSet::MoveNext() {
     if (statement_ && !atEnd_) {
         std::for_each(fields_.begin(), fields_.end(), LetGoIfHeld);
-        atEnd_ = sqlite3_step(statement_.get()) != SQLITE_ROW;
+        atEnd_ = Step(statement_.get()) != SQLITE_ROW;
     }
 }
 
@@ -153,12 +186,10 @@ bool SQLiteDatabase::Connect() {
     if (!std::filesystem::is_regular_file(file, error)) {
         return false;
     }
-    std::string uri = "file:" + UriPath(file.string()) + "?mode=ro";
-    if (IsWalWithoutLog(file)) {
-        // No writer has it open, so it is read as it stands: opened as usual, SQLite would
-        // leave a -wal and a -shm file beside the store.
-        uri += "&immutable=1";
-    }
+    // Read under SQLite's own locks, so that a read sees one committed state of a file that a
+    // writer changes meanwhile. In WAL mode they live in a -shm file beside the store, which
+    // SQLite makes, with an empty -wal, if no writer has.
+    const std::string uri = "file:" + UriPath(file.string()) + "?mode=ro";
     sqlite3* db = nullptr;
     // A connection lives inside one handler on the one thread, so SQLite's own lock on every
     // call would be pure cost.
@@ -168,8 +199,10 @@ bool SQLiteDatabase::Connect() {
     if (opened != SQLITE_OK) {
         return false;
     }
-    sqlite3_busy_timeout(db, kBusyMilliseconds);
+    sqlite3_busy_handler(db, OnBusy, nullptr);
+    sqlite3_progress_handler(db, kProgressInstructions, OnProgress, nullptr);
     // Opening is lazy: reading the schema tells whether this is a database that can be read.
+    workBegan = Clock::now();
     if (sqlite3_exec(db, "select count(*) from sqlite_master", nullptr, nullptr, nullptr) !=
         SQLITE_OK) {
         return false;
@@ -184,6 +217,7 @@ Ref<RecordSet> SQLiteDatabase::SQLSelect(const std::string& statement) {
     }
     sqlite3_stmt* prepared = nullptr;
     const char* tail = nullptr;
+    workBegan = Clock::now();  // a changed schema is read again here
     const int result = sqlite3_prepare_v2(connection_.get(), statement.c_str(),
                                           static_cast<int>(statement.size()), &prepared, &tail);
     StatementPtr owned(prepared);
@@ -194,7 +228,7 @@ Ref<RecordSet> SQLiteDatabase::SQLSelect(const std::string& statement) {
     if (!IsBlankTail(connection_.get(), rest.c_str())) {
         return nullptr;
     }
-    const int first = sqlite3_step(owned.get());
+    const int first = Step(owned.get());
     if (first != SQLITE_ROW && first != SQLITE_DONE) {
         return nullptr;
     }
@@ -203,4 +237,12 @@ Ref<RecordSet> SQLiteDatabase::SQLSelect(const std::string& statement) {
 
 void SQLiteDatabase::Close() {
     connection_.reset();
+}
+
+void SQLiteDatabase::SetWaitHook(void (*hook)()) {
+    waitHook = hook;
+}
+
+void SQLiteDatabase::SetQuietLimitForTesting(std::chrono::milliseconds limit) {
+    quietLimit = limit;
 }

@@ -3,6 +3,7 @@
 // never holds the whole result.
 #pragma once
 
+#include <chrono>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -84,10 +85,16 @@ class SQLiteDatabase {
     // Opens DatabaseFile read-only if it is a regular file; true if it can now be queried. A
     // busy or locked file is waited on for at most kBusyMilliseconds.
     bool Connect();
-    // Runs one statement. Nil if it fails, or if any statement follows it in the text.
+    // Runs one statement. Nil if it fails, or if any statement follows it in the text. A
+    // statement that gives no row for 30 s fails, as the step to its next row does later.
     Ref<RecordSet> SQLSelect(const std::string& statement);
     // Harmless on an object that never connected.
     void Close();
+
+    // What a read calls while it waits for a lock or works through a query that gives no row:
+    // the run-time sets its yield here, so that the windows keep painting.
+    static void SetWaitHook(void (*hook)());
+    static void SetQuietLimitForTesting(std::chrono::milliseconds limit);
 
     static constexpr int kBusyMilliseconds = 2000;
 
