@@ -1,11 +1,14 @@
 // Reads that would not end by themselves, on the real window: a store locked by a writer, a
-// view that never gives a row, an id that never ends. The window repaints
+// view without end, a view that never gives a row, an id that never ends. The window repaints
 // meanwhile, and each read ends in silence within a bound. And a store written during a load
 // is listed as it stood when the load began.
+#include <unistd.h>
+
 #include <chrono>
 #include <cstdio>
 
 #include "platform/core/database.h"
+#include "platform/core/memory_bound.h"
 #include "platform/runtime/yield.h"
 #include "window_fixture.h"
 
@@ -23,15 +26,27 @@ const std::string kEndlessView = "create view results_store as " + kEndless +
                                  "select n as id, 'x' as datetime, hex(zeroblob(500)) as "
                                  "document, 'A' as grade, 'Code reads ' || n as results from r";
 
+size_t ResidentBytes() {
+    size_t pages = 0;
+    size_t resident = 0;
+    if (std::FILE* statm = std::fopen("/proc/self/statm", "r")) {
+        EXPECT_EQ(std::fscanf(statm, "%zu %zu", &pages, &resident), 2);
+        std::fclose(statm);
+    }
+    return resident * static_cast<size_t>(sysconf(_SC_PAGESIZE));
+}
+
 class LongReadTest : public WindowTest {
   protected:
     void SetUp() override {
         SQLiteDatabase::SetQuietLimitForTesting(
             std::chrono::duration_cast<std::chrono::milliseconds>(kQuietLimit));
+        SetMemoryBoundForTesting(ResidentBytes() + (size_t{64} << 20));
         SetYieldPaintObserverForTesting([this](auto) { Painted(); });
     }
     void TearDown() override {
         SQLiteDatabase::SetQuietLimitForTesting(std::chrono::seconds(30));
+        SetMemoryBoundForTesting(0);
         SetYieldPaintObserverForTesting(nullptr);
         SetYieldIntervalForTesting(std::chrono::milliseconds(50));
         WindowTest::TearDown();
@@ -100,6 +115,8 @@ INSTANTIATE_TEST_SUITE_P(
     ::testing::Values(
         // The lock is waited for as long as the bound, and the list stays as it was.
         LongLoad{"LockedByAWriter", demo::kSchema, true, 0, 0},
+        // Rows until the process's memory passes its bound; those read so far stay.
+        LongLoad{"EndlessView", kEndlessView, false, 1000, 1 << 30},
         // No row ever: the statement is ended once it has given none for the quiet limit.
         LongLoad{"ViewThatNeverGivesARow", kEndlessView + " where n < 0", false, 0, 0}),
     [](const auto& info) { return std::string(info.param.name); });

@@ -10,6 +10,7 @@
 #include <system_error>
 #include <thread>
 
+#include "platform/core/memory_bound.h"
 #include "platform/core/text.h"
 
 namespace {
@@ -53,6 +54,9 @@ using Clock = std::chrono::steady_clock;
 constexpr auto kLockWait = std::chrono::milliseconds(SQLiteDatabase::kBusyMilliseconds);
 constexpr auto kLockPause = std::chrono::milliseconds(10);
 constexpr int kProgressInstructions = 1000;
+// Texts handed out, a row counting as this much at least, between two looks at the memory.
+constexpr size_t kRowWeight = 1024;
+constexpr size_t kLookEvery = size_t{4} << 20;
 
 void (*waitHook)() = nullptr;
 std::chrono::milliseconds quietLimit = std::chrono::seconds(30);
@@ -150,6 +154,7 @@ Ref<DatabaseField> RecordSet::FieldAt(size_t column) const {
     sqlite3_value* value = sqlite3_column_value(statement_.get(), static_cast<int>(column));
     const auto* text = reinterpret_cast<const char*>(sqlite3_value_text(value));
     const auto bytes = static_cast<size_t>(sqlite3_value_bytes(value));
+    sinceLook_ += bytes;
     Ref<DatabaseField>& field = fields_[column];
     LetGoIfHeld(field);
     if (!field) {
@@ -163,6 +168,16 @@ Ref<DatabaseField> RecordSet::FieldAt(size_t column) const {
 void RecordSet::MoveNext() {
     if (statement_ && !atEnd_) {
         std::for_each(fields_.begin(), fields_.end(), LetGoIfHeld);
+        // Rows that would take the process past its memory bound end here, as a failed step
+        // ends them: the caller keeps what it has.
+        sinceLook_ += kRowWeight;
+        if (sinceLook_ >= kLookEvery) {
+            sinceLook_ = 0;
+            if (PastMemoryBound()) {
+                atEnd_ = true;
+                return;
+            }
+        }
         atEnd_ = Step(statement_.get()) != SQLITE_ROW;
     }
 }
