@@ -49,9 +49,9 @@ struct Driver {
     std::mt19937 random;
 };
 
-// InOrder is a list load: rows added and filled only at the end and read back at random, so rows
-// are found from the sparse places kept while they stay in order; then one earlier row changes.
-// Otherwise any row is rewritten, most often one that is not the last, with sorts and clears.
+// InOrder is a list load: rows added and filled only at the end, mostly field by field in place,
+// and read back at random; then one earlier row changes. Otherwise any row is rewritten, most
+// often one that is not the last, with sorts and clears.
 struct RandomCase {
     unsigned seed;
     bool inOrder;
@@ -107,7 +107,7 @@ TEST_P(RowStoreRandomTest, AgreesWithAPlainVectorOfRows) {
     }
     ExpectSame(store, model, "end");
     if (inOrder && !model.empty()) {
-        store.SetField(0, 1, "changed");  // an earlier row: every place is kept from now on
+        store.SetField(0, 1, "changed");  // an earlier row, written anew behind the last
         model[0][1] = "changed";
         store.AddRow();
         model.emplace_back(kFields);

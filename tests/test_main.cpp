@@ -13,7 +13,8 @@ int main(int argc, char** argv) {
     // portal's own tests put a private bus here.
     qputenv("DBUS_SESSION_BUS_ADDRESS", "");
     QApplication app(argc, argv);
-    UseUnhintedText();  // as the program draws its text
+    RuntimeInit(argc, argv);  // the rest of the run-time, as the program brings it up
+    UseUnhintedText();        // as the program draws its text
     QApplication::setQuitOnLastWindowClosed(false);
     ::testing::InitGoogleTest(&argc, argv);
     return RUN_ALL_TESTS();

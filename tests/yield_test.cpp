@@ -82,7 +82,7 @@ TEST_P(SameListTest, APaintingLoadLeavesTheSameListAsAnEmptyYield) {
     SetYieldIntervalForTesting(std::chrono::nanoseconds(0));
     SetYieldPaintObserverForTesting([&](auto) { ++paints; });
     Reload(window);
-    EXPECT_EQ(paints, kRows) << "a zero interval paints at every yield";
+    EXPECT_GE(paints, kRows) << "a zero interval paints at every yield";
     EXPECT_EQ(State(window), empty);
 }
 

@@ -3,29 +3,26 @@
 
 #include <sqlite3.h>
 
+#include <algorithm>
+#include <chrono>
 #include <filesystem>
-#include <fstream>
 #include <string_view>
 #include <system_error>
+#include <thread>
 
+#include "platform/core/memory_bound.h"
 #include "platform/core/text.h"
 
 namespace {
 
-// What Field hands out for no such column, or no current row: a reference to it stays valid
-// until the program ends.
-constinit const Ref<DatabaseField> kNil;
-
 bool IsBlankTail(sqlite3* db, const char* tail) {
     // Only blanks and comments may follow: a second statement makes the text fail.
     while (tail && *tail) {
-        sqlite3_stmt* next = nullptr;
+        sqlite3_stmt* prepared = nullptr;
         const char* rest = nullptr;
-        if (sqlite3_prepare_v2(db, tail, -1, &next, &rest) != SQLITE_OK) {
-            return false;
-        }
-        if (next) {
-            sqlite3_finalize(next);
+        const int result = sqlite3_prepare_v2(db, tail, -1, &prepared, &rest);
+        const StatementPtr next(prepared);
+        if (result != SQLITE_OK || next) {
             return false;
         }
         if (rest == tail) {
@@ -52,41 +49,78 @@ std::string UriPath(const std::string& path) {
     return out;
 }
 
-// A database file in WAL mode (versions 2 in its header) with no -wal file beside it: the
-// last writer has closed it, and everything stands in the file itself.
-bool IsWalWithoutLog(const std::filesystem::path& file) {
-    char header[20] = {};
-    std::ifstream in(file, std::ios::binary);
-    if (!in.read(header, sizeof header) ||
-        std::string_view(header, 16) != std::string_view("SQLite format 3\0", 16)) {
-        return false;
+using Clock = std::chrono::steady_clock;
+
+constexpr auto kLockWait = std::chrono::milliseconds(SQLiteDatabase::kBusyMilliseconds);
+constexpr auto kLockPause = std::chrono::milliseconds(10);
+constexpr int kProgressInstructions = 1000;
+// Texts handed out, a row counting as this much at least, between two looks at the memory.
+constexpr size_t kRowWeight = 1024;
+constexpr size_t kLookEvery = size_t{4} << 20;
+
+void (*waitHook)() = nullptr;
+std::chrono::milliseconds quietLimit = std::chrono::seconds(30);
+// When the current call into SQLite began. Reads run on one thread, one call at a time.
+Clock::time_point workBegan;
+
+// A lock that another connection holds is waited for, kLockWait at most, with the hook called
+// between two tries.
+int OnBusy(void*, int tries) {
+    static Clock::time_point waitBegan;
+    const auto now = Clock::now();
+    if (tries == 0) {
+        waitBegan = now;
     }
-    std::error_code error;
-    return (header[18] == 2 || header[19] == 2) &&
-           !std::filesystem::exists(file.string() + "-wal", error);
+    if (now - waitBegan >= kLockWait) {
+        return 0;
+    }
+    if (waitHook) {
+        waitHook();
+    }
+    std::this_thread::sleep_for(kLockPause);
+    return 1;
+}
+
+// Called every kProgressInstructions steps of SQLite's machine: a call that has given no row for
+// the quiet limit is interrupted, and fails as any other failed call does.
+int OnProgress(void*) {
+    if (Clock::now() - workBegan > quietLimit) {
+        return 1;
+    }
+    if (waitHook) {
+        waitHook();
+    }
+    return 0;
+}
+
+int Step(sqlite3_stmt* statement) {
+    workBegan = Clock::now();
+    return sqlite3_step(statement);
+}
+
+// A field that someone else still holds keeps its own copy of the text, and leaves the pool.
+void LetGoIfHeld(Ref<DatabaseField>& field) {
+    if (field && field.Shared().use_count() > 1) {
+        field->Keep();
+        field = nullptr;
+    }
 }
 
 }  // namespace
 
-void DatabaseField::Refer(const char* text, size_t bytes) {
-    if (!kept_.empty()) {
-        kept_ = std::string();  // a huge text kept before goes back to the system
-    }
-    value_ = std::string_view(text, bytes);
+void FinalizeStatement::operator()(sqlite3_stmt* statement) const {
+    sqlite3_finalize(statement);
 }
 
-void DatabaseField::Keep() {
-    if (value_.data() != kept_.data()) {
-        kept_.assign(value_);
-        value_ = kept_;
-    }
+void CloseConnection::operator()(sqlite3* connection) const {
+    sqlite3_close_v2(connection);
 }
 
-RecordSet::RecordSet(std::shared_ptr<sqlite3> connection, sqlite3_stmt* statement, bool atEnd)
-    : connection_(std::move(connection)), statement_(statement), atEnd_(atEnd) {
-    const int count = sqlite3_column_count(statement_);
+RecordSet::RecordSet(StatementPtr statement, bool atEnd)
+    : statement_(std::move(statement)), atEnd_(atEnd) {
+    const int count = sqlite3_column_count(statement_.get());
     for (int i = 0; i < count; ++i) {
-        const char* name = sqlite3_column_name(statement_, i);
+        const char* name = sqlite3_column_name(statement_.get(), i);
         columns_.emplace_back(name ? name : "");
     }
     fields_.resize(columns_.size());
@@ -96,77 +130,63 @@ RecordSet::~RecordSet() {
     Close();
 }
 
-const Ref<DatabaseField>& RecordSet::Field(std::string_view name) const {
+Ref<DatabaseField> RecordSet::Field(std::string_view name) const {
     if (!statement_ || atEnd_) {
-        return kNil;
+        return nullptr;
     }
-    int column = -1;
-    // A loop asks the same names in the same order: the one behind the last is tried first.
-    if (nextAsked_ < asked_.size() && asked_[nextAsked_].first == name) {
-        column = asked_[nextAsked_].second;
-    } else {
-        nextAsked_ = 0;
-        for (; nextAsked_ < asked_.size(); ++nextAsked_) {
-            if (asked_[nextAsked_].first == name) {
-                column = asked_[nextAsked_].second;
-                break;
-            }
+    for (const auto& [asked, column] : found_) {
+        if (asked == name) {
+            return FieldAt(column);
         }
     }
-    ++nextAsked_;
-    if (column < 0) {
-        for (size_t i = 0; i < columns_.size() && column < 0; ++i) {
-            if (TextEquals(columns_[i], name)) {
-                column = static_cast<int>(i);
-            }
+    for (size_t column = 0; column < columns_.size(); ++column) {
+        if (TextEquals(columns_[column], name)) {
+            found_.emplace_back(name, column);
+            return FieldAt(column);
         }
-        if (column < 0) {
-            return kNil;
-        }
-        asked_.emplace_back(name, column);
     }
-    // The column's value is asked for once, rather than once for its text and once for its
-    // length. SQLite hands it out unprotected, which only matters to another thread, and the
-    // connection is this thread's alone.
-    sqlite3_value* value = sqlite3_column_value(statement_, column);
+    return nullptr;
+}
+
+// SQLite hands out the column's value unprotected, which only matters to another thread, and
+// the connection is this thread's alone.
+Ref<DatabaseField> RecordSet::FieldAt(size_t column) const {
+    sqlite3_value* value = sqlite3_column_value(statement_.get(), static_cast<int>(column));
     const auto* text = reinterpret_cast<const char*>(sqlite3_value_text(value));
-    const auto bytes = text ? static_cast<size_t>(sqlite3_value_bytes(value)) : 0;
-    Ref<DatabaseField>& field = fields_[static_cast<size_t>(column)];
-    if (!field || field.Shared().use_count() > 1) {
-        if (field) {
-            field->Keep();  // it stays with its holder
-        }
+    const auto bytes = static_cast<size_t>(sqlite3_value_bytes(value));
+    sinceLook_ += bytes;
+    Ref<DatabaseField>& field = fields_[column];
+    LetGoIfHeld(field);
+    if (!field) {
         field = New<DatabaseField>();
     }
-    field->Refer(text ? text : "", bytes);
+    field->Show(text ? std::string_view(text, bytes) : std::string_view());
     return field;
 }
 
 // A failure while stepping ends the rows, as the end of the result would.
 void RecordSet::MoveNext() {
     if (statement_ && !atEnd_) {
-        KeepHeldFields();
-        atEnd_ = sqlite3_step(statement_) != SQLITE_ROW;
-    }
-}
-
-void RecordSet::KeepHeldFields() {
-    for (const auto& field : fields_) {
-        if (field && field.Shared().use_count() > 1) {
-            field->Keep();
+        std::for_each(fields_.begin(), fields_.end(), LetGoIfHeld);
+        // Rows that would take the process past its memory bound end here, as a failed step
+        // ends them: the caller keeps what it has.
+        sinceLook_ += kRowWeight;
+        if (sinceLook_ >= kLookEvery) {
+            sinceLook_ = 0;
+            if (PastMemoryBound()) {
+                atEnd_ = true;
+                return;
+            }
         }
+        atEnd_ = Step(statement_.get()) != SQLITE_ROW;
     }
 }
 
 void RecordSet::Close() {
-    KeepHeldFields();
-    if (statement_) {
-        sqlite3_finalize(statement_);
-        statement_ = nullptr;
-    }
+    std::for_each(fields_.begin(), fields_.end(), LetGoIfHeld);
+    statement_.reset();
     fields_.clear();
     atEnd_ = true;
-    connection_.reset();
 }
 
 bool SQLiteDatabase::Connect() {
@@ -181,23 +201,23 @@ bool SQLiteDatabase::Connect() {
     if (!std::filesystem::is_regular_file(file, error)) {
         return false;
     }
-    std::string uri = "file:" + UriPath(file.string()) + "?mode=ro";
-    if (IsWalWithoutLog(file)) {
-        // No writer has it open, so it is read as it stands: opened as usual, SQLite would
-        // leave a -wal and a -shm file beside the store.
-        uri += "&immutable=1";
-    }
+    // Read under SQLite's own locks, so that a read sees one committed state of a file that a
+    // writer changes meanwhile. In WAL mode they live in a -shm file beside the store, which
+    // SQLite makes, with an empty -wal, if no writer has.
+    const std::string uri = "file:" + UriPath(file.string()) + "?mode=ro";
     sqlite3* db = nullptr;
     // A connection lives inside one handler on the one thread, so SQLite's own lock on every
     // call would be pure cost.
     const int opened = sqlite3_open_v2(
         uri.c_str(), &db, SQLITE_OPEN_READONLY | SQLITE_OPEN_URI | SQLITE_OPEN_NOMUTEX, nullptr);
-    std::shared_ptr<sqlite3> connection(db, sqlite3_close_v2);
+    ConnectionPtr connection(db);
     if (opened != SQLITE_OK) {
         return false;
     }
-    sqlite3_busy_timeout(db, kBusyMilliseconds);
+    sqlite3_busy_handler(db, OnBusy, nullptr);
+    sqlite3_progress_handler(db, kProgressInstructions, OnProgress, nullptr);
     // Opening is lazy: reading the schema tells whether this is a database that can be read.
+    workBegan = Clock::now();
     if (sqlite3_exec(db, "select count(*) from sqlite_master", nullptr, nullptr, nullptr) !=
         SQLITE_OK) {
         return false;
@@ -212,24 +232,32 @@ Ref<RecordSet> SQLiteDatabase::SQLSelect(const std::string& statement) {
     }
     sqlite3_stmt* prepared = nullptr;
     const char* tail = nullptr;
-    if (sqlite3_prepare_v2(connection_.get(), statement.c_str(), static_cast<int>(statement.size()),
-                           &prepared, &tail) != SQLITE_OK ||
-        !prepared) {
+    workBegan = Clock::now();  // a changed schema is read again here
+    const int result = sqlite3_prepare_v2(connection_.get(), statement.c_str(),
+                                          static_cast<int>(statement.size()), &prepared, &tail);
+    StatementPtr owned(prepared);
+    if (result != SQLITE_OK || !owned) {
         return nullptr;
     }
     const std::string rest(tail, statement.c_str() + statement.size() - tail);
     if (!IsBlankTail(connection_.get(), rest.c_str())) {
-        sqlite3_finalize(prepared);
         return nullptr;
     }
-    const int first = sqlite3_step(prepared);
+    const int first = Step(owned.get());
     if (first != SQLITE_ROW && first != SQLITE_DONE) {
-        sqlite3_finalize(prepared);
         return nullptr;
     }
-    return New<RecordSet>(connection_, prepared, first == SQLITE_DONE);
+    return New<RecordSet>(std::move(owned), first == SQLITE_DONE);
 }
 
 void SQLiteDatabase::Close() {
     connection_.reset();
+}
+
+void SQLiteDatabase::SetWaitHook(void (*hook)()) {
+    waitHook = hook;
+}
+
+void SQLiteDatabase::SetQuietLimitForTesting(std::chrono::milliseconds limit) {
+    quietLimit = limit;
 }

@@ -1,5 +1,5 @@
-// Packed rows: a record is, for each field, a varint length and the bytes. A location is the
-// chunk's number in the high half and the offset in the low half.
+// Packed rows: a record is, for each field, a varint length and the bytes. A change to a row
+// writes its whole record anew behind the last one; the last record itself is written over.
 #include "platform/core/row_store.h"
 
 #include <algorithm>
@@ -9,6 +9,10 @@
 #include "platform/core/text.h"
 
 namespace {
+
+constexpr size_t kChunkSize = 1 << 20;
+constexpr uint64_t kOffsetMask = 0xFFFFFFFF;
+constexpr size_t kMaxLengthBytes = 10;  // of a 64-bit length
 
 char* PutLength(char* out, size_t length) {
     while (length >= 0x80) {
@@ -20,24 +24,8 @@ char* PutLength(char* out, size_t length) {
 }
 
 void PutLength(std::string& out, size_t length) {
-    char bytes[10];  // a 64-bit length takes at most ten
+    char bytes[kMaxLengthBytes];
     out.append(bytes, PutLength(bytes, length));
-}
-
-size_t LengthSize(size_t length) {
-    size_t size = 1;
-    while (length >= 0x80) {
-        length >>= 7;
-        ++size;
-    }
-    return size;
-}
-
-// The record being rebuilt is kept between calls, unless a huge text made it huge.
-void ReleaseIfHuge(std::string& scratch, size_t limit) {
-    if (scratch.capacity() > limit) {
-        scratch = std::string();
-    }
 }
 
 size_t GetLength(const char*& at) {
@@ -51,18 +39,13 @@ size_t GetLength(const char*& at) {
     }
 }
 
-std::string_view FieldOf(const char* record, int field) {
-    const char* at = record;
-    for (int i = 0;; ++i) {
-        const size_t length = GetLength(at);
-        if (i == field) {
-            return {at, length};
-        }
-        at += length;
+// The start of a record's field.
+const char* FieldStart(const char* record, int field) {
+    for (int i = 0; i < field; ++i) {
+        record += GetLength(record);
     }
+    return record;
 }
-
-constexpr uint64_t kOffsetMask = 0xFFFFFFFF;
 
 }  // namespace
 
@@ -72,126 +55,67 @@ void RowStore::SetFieldCount(int fieldCount) {
 }
 
 void RowStore::AddRow() {
-    CommitTail();
-    if (chunks_.empty()) {
-        chunks_.push_back({std::make_unique_for_overwrite<char[]>(kChunkSize), kChunkSize, 0});
-    }
-    tailRecord_ = (static_cast<uint64_t>(chunks_.size() - 1) << 32) | chunks_.back().used;
-    tailFields_ = 0;
-    tailOpen_ = true;
-    ++count_;
+    places_.push_back(Append(std::string(static_cast<size_t>(fieldCount_), '\0')));
 }
 
 std::string_view RowStore::Field(size_t row, int field) const {
-    if (tailOpen_ && row + 1 == count_) {
-        return field < tailFields_ ? FieldOf(RecordAt(tailRecord_), field) : std::string_view();
-    }
-    return FieldOf(RecordAt(Location(row)), field);
+    const char* at = FieldStart(RecordAt(places_[row]), field);
+    const size_t length = GetLength(at);
+    return {at, length};
 }
 
 void RowStore::SetField(size_t row, int field, std::string_view text) {
-    if (tailOpen_ && row + 1 == count_ && field == tailFields_) {
-        char* out = PutLength(ExtendTail(LengthSize(text.size()) + text.size()), text.size());
+    const uint64_t place = places_[row];
+    const char* record = RecordAt(place);
+    Chunk& last = chunks_.back();
+    const bool inLastChunk = place >> 32 == chunks_.size() - 1;
+    // A list load fills its last row field by field. While this field and those behind it are
+    // empty, the chunk ends in their zero lengths, one byte each, and the field is written
+    // there, where there is room. Writing the whole record anew made the load 9% longer.
+    const char* start = FieldStart(record, field);
+    const auto rest = static_cast<size_t>(fieldCount_ - field);
+    if (inLastChunk && last.bytes.get() + last.used - start == static_cast<ptrdiff_t>(rest) &&
+        last.used + kMaxLengthBytes + text.size() <= last.size) {
+        char* out = PutLength(last.bytes.get() + (last.used - rest), text.size());
         std::memcpy(out, text.data(), text.size());
-        ++tailFields_;
+        std::memset(out + text.size(), 0, rest - 1);
+        last.used = static_cast<size_t>(out - last.bytes.get()) + text.size() + rest - 1;
         return;
     }
-    CommitTail();
-    const uint64_t place = Location(row);
-    const bool lastWritten = place == lastRecord_;
-    if (!lastWritten) {
-        MakePlaces();  // the new record will stand behind the last one, out of order
-    }
-    const char* old = RecordAt(place);
-    std::string& record = scratch_;
-    record.clear();
+    record_.clear();
+    const char* at = record;
     for (int i = 0; i < fieldCount_; ++i) {
-        const std::string_view value = i == field ? text : FieldOf(old, i);
-        PutLength(record, value.size());
-        record += value;
+        const size_t length = GetLength(at);
+        PutLength(record_, i == field ? text.size() : length);
+        record_.append(i == field ? text : std::string_view(at, length));
+        at += length;
     }
-    if (lastWritten) {
-        DropLastRecord();  // written over rather than left behind
+    // The last record is written over rather than left behind.
+    if (inLastChunk && at == last.bytes.get() + last.used) {
+        last.used = place & kOffsetMask;
+        if (last.used == 0) {
+            chunks_.pop_back();  // it held this record alone
+        }
     }
-    std::memcpy(Reserve(record.size()), record.data(), record.size());
-    if (!inOrder_) {
-        places_[row] = lastRecord_;
-    } else if (row % kStride == 0) {
-        marks_.back() = lastRecord_;
-    }
-    foundRow_ = SIZE_MAX;
-    ReleaseIfHuge(scratch_, kChunkSize);
-}
-
-// A record never spans two chunks: one that outgrows its chunk moves, whole, to a new one.
-char* RowStore::MoveTail(size_t bytes) {
-    chunks_.reserve(chunks_.size() + 1);  // nothing below can fail half done
-    Chunk* chunk = &chunks_.back();
-    const size_t start = tailRecord_ & kOffsetMask;
-    const size_t written = chunk->used - start;
-    // Room for the rest of the row too: a huge field is not copied again by the next.
-    const size_t size = written + bytes + kChunkSize;
-    auto moved = std::make_unique_for_overwrite<char[]>(size);
-    std::memcpy(moved.get(), chunk->bytes.get() + start, written);
-    chunk->used = start;
-    if (start == 0) {
-        chunks_.pop_back();  // it held nothing else
-    }
-    chunks_.push_back({std::move(moved), size, written + bytes});
-    tailRecord_ = static_cast<uint64_t>(chunks_.size() - 1) << 32;
-    return chunks_.back().bytes.get() + written;
-}
-
-// The row being filled gets empty texts for the fields it never got, and is the last record.
-void RowStore::CommitTail() {
-    if (!tailOpen_) {
-        return;
-    }
-    tailOpen_ = false;
-    if (tailFields_ < fieldCount_) {
-        const auto missing = static_cast<size_t>(fieldCount_ - tailFields_);
-        std::memset(ExtendTail(missing), 0, missing);  // a length 0 is one zero byte
-    }
-    lastRecord_ = tailRecord_;
-    const size_t row = count_ - 1;
-    if (!inOrder_) {
-        places_.push_back(lastRecord_);
-    } else if (row % kStride == 0) {
-        marks_.push_back(lastRecord_);
-    }
-}
-
-// The last row's record is always the last one written; a chunk that it leaves empty goes.
-void RowStore::DropLastRecord() {
-    chunks_.back().used = static_cast<size_t>(lastRecord_ & kOffsetMask);
-    if (chunks_.back().used == 0) {
-        chunks_.pop_back();
+    places_[row] = Append(record_);
+    if (record_.capacity() > kChunkSize) {
+        record_ = std::string();  // a huge text goes back to the system
     }
 }
 
 void RowStore::Clear() {
-    tailOpen_ = false;
-    chunks_.clear();
-    chunks_.shrink_to_fit();
-    count_ = 0;
-    inOrder_ = true;
-    marks_ = {};
+    chunks_ = std::vector<Chunk>();
     places_ = {};
-    lastRecord_ = UINT64_MAX;
-    foundRow_ = SIZE_MAX;
 }
 
 std::vector<uint32_t> RowStore::SortBy(int field, bool descending) {
-    CommitTail();
-    MakePlaces();
-    std::vector<uint32_t> order(count_);
+    std::vector<uint32_t> order(places_.size());
     std::iota(order.begin(), order.end(), 0u);
     std::stable_sort(order.begin(), order.end(), [&](uint32_t a, uint32_t b) {
-        const int c = RuntimeStringCompare(FieldOf(RecordAt(places_[a]), field),
-                                           FieldOf(RecordAt(places_[b]), field));
+        const int c = RuntimeStringCompare(Field(a, field), Field(b, field));
         return descending ? c > 0 : c < 0;
     });
-    std::vector<uint64_t> sorted(count_);
+    std::vector<uint64_t> sorted(places_.size());
     for (size_t i = 0; i < order.size(); ++i) {
         sorted[i] = places_[order[i]];
     }
@@ -199,71 +123,20 @@ std::vector<uint32_t> RowStore::SortBy(int field, bool descending) {
     return order;
 }
 
-// Room for a record of `bytes` behind the last one; lastRecord_ is its location.
-char* RowStore::Reserve(size_t bytes) {
-    if (chunks_.empty() || chunks_.back().used + bytes > chunks_.back().size) {
-        const size_t size = std::max(bytes, kChunkSize);
+const char* RowStore::RecordAt(uint64_t place) const {
+    return chunks_[place >> 32].bytes.get() + (place & kOffsetMask);
+}
+
+// A record never spans two chunks: one that does not fit starts a new chunk, of its own size
+// and room for more if it is larger than a chunk.
+uint64_t RowStore::Append(std::string_view record) {
+    if (chunks_.empty() || chunks_.back().used + record.size() > chunks_.back().size) {
+        const size_t size = std::max(record.size() + kChunkSize / 16, kChunkSize);
         chunks_.push_back({std::make_unique_for_overwrite<char[]>(size), size, 0});
     }
     Chunk& chunk = chunks_.back();
-    lastRecord_ = (static_cast<uint64_t>(chunks_.size() - 1) << 32) | chunk.used;
-    chunk.used += bytes;
-    return chunk.bytes.get() + (lastRecord_ & kOffsetMask);
-}
-
-uint64_t RowStore::Location(size_t row) const {
-    if (!inOrder_) {
-        return places_[row];
-    }
-    const size_t written = tailOpen_ ? count_ - 1 : count_;  // the rows that have a record
-    if (row + 1 == written) {
-        return lastRecord_;
-    }
-    uint64_t at = 0;
-    size_t from = 0;
-    if (foundRow_ <= row && row - foundRow_ < row % kStride) {
-        at = foundAt_;
-        from = foundRow_;
-    } else {
-        at = marks_[row / kStride];
-        from = row - row % kStride;
-    }
-    for (; from < row; ++from) {
-        at = NextLocation(at);
-    }
-    foundRow_ = row;
-    foundAt_ = at;
-    return at;
-}
-
-// The record behind the one at `location`, in the same chunk or at the start of the next.
-uint64_t RowStore::NextLocation(uint64_t location) const {
-    const size_t chunk = location >> 32;
-    const char* record = RecordAt(location);
-    const char* at = record;
-    for (int i = 0; i < fieldCount_; ++i) {
-        at += GetLength(at);
-    }
-    const size_t end = (location & kOffsetMask) + static_cast<size_t>(at - record);
-    if (end == chunks_[chunk].used) {
-        return static_cast<uint64_t>(chunk + 1) << 32;
-    }
-    return (static_cast<uint64_t>(chunk) << 32) | end;
-}
-
-const char* RowStore::RecordAt(uint64_t location) const {
-    return chunks_[location >> 32].bytes.get() + (location & kOffsetMask);
-}
-
-void RowStore::MakePlaces() {
-    if (!inOrder_) {
-        return;
-    }
-    places_.resize(count_);
-    for (size_t row = 0; row < count_; ++row) {
-        places_[row] = row % kStride == 0 ? marks_[row / kStride] : NextLocation(places_[row - 1]);
-    }
-    marks_ = {};
-    inOrder_ = false;
-    foundRow_ = SIZE_MAX;
+    const uint64_t place = (static_cast<uint64_t>(chunks_.size() - 1) << 32) | chunk.used;
+    std::memcpy(chunk.bytes.get() + chunk.used, record.data(), record.size());
+    chunk.used += record.size();
+    return place;
 }

@@ -17,10 +17,12 @@
 #include <malloc.h>
 #endif
 
+#include "platform/core/database.h"
 #include "platform/core/folder_item.h"
 #include "platform/core/resources_folder.h"
 #include "platform/runtime/application.h"
 #include "platform/runtime/application_style.h"
+#include "platform/runtime/yield.h"
 
 namespace {
 ExceptionHelper exceptionHelper = nullptr;
@@ -151,6 +153,9 @@ void RuntimeInit(int argc, char** argv) {
     mallopt(M_MMAP_THRESHOLD, 1 << 20);
 #endif
     MakeFileSystemRootAbsolute();
+    // A read that waits for a lock, or works through a query that gives no row, gives way as
+    // a long loop does.
+    SQLiteDatabase::SetWaitHook(&RuntimeBackgroundTask);
     if (QApplication::instance()) {
         return;
     }

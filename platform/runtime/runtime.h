@@ -11,8 +11,9 @@
 using ExceptionHelper = std::shared_ptr<RuntimeException> (*)(const std::function<void(void*)>&,
                                                               void*);
 
-// Makes the file-system root absolute, then the Qt application object unless one exists
-// already (tests make their own). Of the arguments only the program's name is used.
+// Makes the file-system root absolute, has database reads give way through the yield, then
+// makes the Qt application object unless one exists already (tests make their own). Of the
+// arguments only the program's name is used.
 void RuntimeInit(int argc, char** argv);
 // Has the application draw its text unhinted; RuntimeInit does so for the application it makes.
 void UseUnhintedText();
