@@ -52,6 +52,7 @@ TEST_F(AccessibilityTest, ThePanesAreNamedByTheirTabsAndEachValueByItsCaption) {
     DoubleClickRow(window, 0);
     ASSERT_EQ(window->PagePanel1()->Value(), 2);
     EXPECT_EQ(Name(window->TextArea1()->Widget()), "Measurements");
+    EXPECT_TRUE(Spoken(window->TextArea1()->Widget()).state().readOnly) << "a text to read";
     window->TabPanel1()->SetValue(1);
     EXPECT_EQ(Name(window->TextArea2()->Widget()), "Deviances");
 

@@ -1,7 +1,7 @@
-// Huge texts from a damaged or hostile store: the list keeps every byte of them, and the list
-// and the report draw a bounded prefix, so that painting never stalls.
+// Huge texts from a damaged or hostile store: the list and the report panes keep every byte of
+// them, and the list cells and the labels draw a bounded prefix, so that painting never stalls.
+#include <QClipboard>
 #include <QLabel>
-#include <QPlainTextEdit>
 
 #include "platform/widgets/shown_text.h"
 #include "window_fixture.h"
@@ -20,7 +20,7 @@ class HugeTextTest : public WindowTest {
     }
 };
 
-TEST_F(HugeTextTest, TheListAndTheReportHoldEveryByteAndDrawAPrefix) {
+TEST_F(HugeTextTest, TheListAndThePanesHoldEveryByteAndTheCellsDrawAPrefix) {
     // The second report's two blocks list 200000 bars each: many short lines.
     const std::string manyLines =
         demo::ReportText(demo::Layout::A, "5012345678900", "EAN 13", 200000);
@@ -40,16 +40,39 @@ TEST_F(HugeTextTest, TheListAndTheReportHoldEveryByteAndDrawAPrefix) {
 
     DoubleClickRow(window, 1);
     ASSERT_EQ(window->PagePanel1()->Value(), 2);
-    EXPECT_EQ(window->TextArea1()->Text().size(), kShownInTextArea);
+    const size_t begin = manyLines.find("= +- mic 0\r") + 11;
+    const std::string block = manyLines.substr(begin, manyLines.find("\rBar/Space") - begin);
+    EXPECT_TRUE(window->TextArea1()->Text() == "    " + block) << "the measurements, whole";
     EXPECT_EQ(window->Label6(7)->Text().size(), kShownInCell);
-    const auto& pane = static_cast<QPlainTextEdit&>(*window->TextArea1()->Widget());
-    EXPECT_EQ(pane.toPlainText().size(), static_cast<qsizetype>(kShownInTextArea) + 1);
     const auto& document = static_cast<QLabel&>(*window->Label6(7)->Widget());
     EXPECT_EQ(document.text().size(), static_cast<qsizetype>(kShownInCell) + 1);
 
     window->PushButton2()->Push();
     EXPECT_EQ(list->ListCount(), 3) << "back on the list, the same rows";
     EXPECT_EQ(list->Cell(1, 1).size(), kHuge);
+}
+
+// A measurements block of 3,300 bars, over 40 KB, goes whole to the clipboard by Select All
+// and Copy, its lines ended by line feeds.
+TEST_F(HugeTextTest, SelectAllAndCopyTakeAWholeBlock) {
+    Store({{"1", "2018-11-04", "Jar.ai", "B",
+            demo::ReportText(demo::Layout::A, "5012345678900", "EAN 13", 3300)}});
+    auto window = StartUp();
+    DoubleClickRow(window, 0);
+    ASSERT_EQ(window->PagePanel1()->Value(), 2);
+    QWidget* pane = window->TextArea1()->Widget();
+    window->Native()->activateWindow();
+    pane->setFocus();
+    ProcessEvents();
+    QGuiApplication::clipboard()->clear();
+    QTest::keyClick(pane, Qt::Key_A, Qt::ControlModifier);
+    QTest::keyClick(pane, Qt::Key_C, Qt::ControlModifier);
+    std::string block = "    Bar 1 660";
+    for (int bar = 2; bar <= 3300; ++bar) {
+        block += "\nBar " + std::to_string(bar) + " " + std::to_string(330 * (1 + bar % 4));
+    }
+    ASSERT_GT(block.size(), 40u << 10);
+    EXPECT_TRUE(QGuiApplication::clipboard()->text().toStdString() == block);
 }
 
 struct ShownCase {

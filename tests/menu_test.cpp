@@ -1,7 +1,5 @@
-// The menu bar in its native form in the window: its shortcuts, Copy and Select All, and Quit.
-#include <QClipboard>
+// The menu bar in its native form in the window: its shortcuts and Quit.
 #include <QMenu>
-#include <QPlainTextEdit>
 #include <QStyle>
 
 #include "platform/runtime/application_style.h"
@@ -22,21 +20,6 @@ TEST_F(MenuTest, TheWindowShowsTheOneBarWithItsShortcuts) {
     QMenu* file = InMenuBar<QMenu>(window, "FileMenu");
     ASSERT_NE(file, nullptr);
     EXPECT_EQ(file->actions().at(0)->shortcut(), QKeySequence("Ctrl+Q"));
-}
-
-TEST_F(MenuTest, CopyAndSelectAllWorkOnTheFocusedReportText) {
-    auto window = StartUp();
-    window->PagePanel1()->SetValue(2);
-    window->TextArea1()->SetText("    Bar 1 330\rBar 2 660");
-    window->Native()->activateWindow();
-    window->TextArea1()->Widget()->setFocus();
-    ProcessEvents();
-    window->EditSelectAll()->Action();
-    auto* editor = static_cast<QPlainTextEdit*>(window->TextArea1()->Widget());
-    EXPECT_EQ(editor->textCursor().selectedText().size(), editor->toPlainText().size());
-    QGuiApplication::clipboard()->clear();
-    window->EditCopy()->Action();
-    EXPECT_EQ(QGuiApplication::clipboard()->text().toStdString(), "    Bar 1 330\nBar 2 660");
 }
 
 TEST_F(MenuTest, QuitEndsTheEventLoopAndClosesTheWindow) {

@@ -1,8 +1,8 @@
 // The window as built from its property blocks and control table: its frame, the controls'
 // starting states and their fonts.
 #include <QFontInfo>
-#include <QPlainTextEdit>
 #include <QPushButton>
+#include <QTest>
 
 #include "window_fixture.h"
 
@@ -26,7 +26,9 @@ TEST_F(WindowTableTest, TheWindowAndItsControlsStartAsAUserFindsThem) {
     EXPECT_THROW(window->Label5(8)->Text(), NilObjectException) << "a set has its own indexes";
     EXPECT_TRUE(static_cast<QPushButton*>(window->PushButton1()->Widget())->isDefault());
     EXPECT_FALSE(static_cast<QPushButton*>(window->PushButton2()->Widget())->isDefault());
-    EXPECT_TRUE(static_cast<QPlainTextEdit*>(window->TextArea1()->Widget())->isReadOnly());
+    window->TextArea1()->SetText("Bar 1 330");
+    QTest::keyClicks(window->TextArea1()->Widget(), "x\b");
+    EXPECT_EQ(window->TextArea1()->Text(), "Bar 1 330") << "read-only";
     EXPECT_EQ(window->MainTabs()->Widget()->width(), 920) << "sized to fit its two segments";
     // The text areas lie above the tab panel that holds them, or they would never show.
     const QObjectList order = window->Client()->children();

@@ -3,7 +3,6 @@
 
 #include <QComboBox>
 #include <QLabel>
-#include <QPlainTextEdit>
 #include <QPushButton>
 #include <QSignalBlocker>
 #include <QStandardItemModel>
@@ -177,10 +176,7 @@ void Label::ApplyAlignment() {
 }
 
 TextArea::TextArea() {
-    auto* edit = new TextPane;
-    edit->setLineWrapMode(QPlainTextEdit::WidgetWidth);
-    edit->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
-    SetWidget(edit);
+    SetWidget(new TextPane);
 }
 
 void TextArea::SetProperty(const std::string& name, const PropertyValue& value) {
@@ -193,10 +189,8 @@ void TextArea::SetProperty(const std::string& name, const PropertyValue& value) 
 }
 
 void TextArea::Apply(const std::string& name, const PropertyValue& value) {
-    auto& edit = static_cast<QPlainTextEdit&>(LiveWidget());
-    if (name == "ReadOnly") {
-        edit.setReadOnly(std::get<bool>(value));
-    } else if (name == "Border") {
+    auto& edit = static_cast<TextPane&>(LiveWidget());
+    if (name == "Border") {
         edit.setFrameShape(std::get<bool>(value) ? QFrame::StyledPanel : QFrame::NoFrame);
     } else if (name == "ScrollbarVertical") {
         edit.setVerticalScrollBarPolicy(std::get<bool>(value) ? Qt::ScrollBarAsNeeded
@@ -204,10 +198,10 @@ void TextArea::Apply(const std::string& name, const PropertyValue& value) {
     }
 }
 
-void TextArea::SetText(const std::string& text) {
-    text_ = ShownPrefix(text, kShownInTextArea);
-    ApplyPendingFont();  // the text is laid out once, in the font it is shown in
-    static_cast<QPlainTextEdit&>(LiveWidget()).setPlainText(ShownLines(text, kShownInTextArea));
+void TextArea::SetText(std::string text) {
+    text_ = std::make_shared<const std::string>(std::move(text));
+    ApplyPendingFont();  // the pane wraps the text in the font it is shown in
+    static_cast<TextPane&>(LiveWidget()).SetText(text_);
 }
 
 TabPanel::TabPanel() {

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <functional>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -69,17 +70,20 @@ class Label : public Control {
     std::string text_;
 };
 
+// A text area shows its text whole, of any length, to be read, selected and copied: the
+// window's text areas are all read-only, and this one takes no typing.
 class TextArea : public Control {
   public:
     TextArea();
     void SetProperty(const std::string& name, const PropertyValue& value) override;
-    std::string Text() const { return text_; }
-    // Replaces the whole content; carriage returns end lines.
-    void SetText(const std::string& text);
+    std::string Text() const { return *text_; }
+    // Replaces the whole content; carriage returns and line feeds end lines.
+    void SetText(std::string text);
 
   private:
     void Apply(const std::string& name, const PropertyValue& value);
-    std::string text_;
+    // Held once, by the control and its pane together.
+    std::shared_ptr<const std::string> text_ = std::make_shared<const std::string>();
 };
 
 // Tabs whose controls show while their tab is chosen. Without tabs no tab is chosen; the

@@ -1,5 +1,6 @@
-// Menus over QMenuBar. The Edit items act on the focused text control as Qt's own editing does,
-// and Copy also on the selected row of a focused list.
+// Menus over QMenuBar. Copy and Select All act on the focused text pane, and Copy also on the
+// selected row of a focused list; the other Edit items find nothing to act on, since every text
+// in a window is read-only.
 #include "platform/widgets/menu.h"
 
 #include <QApplication>
@@ -7,16 +8,16 @@
 #include <QLineEdit>
 #include <QMenu>
 #include <QMenuBar>
-#include <QPlainTextEdit>
 
 #include "platform/runtime/application.h"
 #include "platform/runtime/runtime.h"
 #include "platform/widgets/list_view.h"
+#include "platform/widgets/text_pane.h"
 
 namespace {
 
-QPlainTextEdit* FocusedEditor() {
-    return qobject_cast<QPlainTextEdit*>(QApplication::focusWidget());
+TextPane* FocusedPane() {
+    return dynamic_cast<TextPane*>(QApplication::focusWidget());
 }
 
 // A focused list offers its selected row to Copy, and nothing to the other Edit items.
@@ -29,21 +30,10 @@ bool EditItemApplies(const std::string& name) {
     if (const ListView* list = FocusedList()) {
         return name == "EditCopy" && list->HasSelectedRow();
     }
-    const QPlainTextEdit* editor = FocusedEditor();
-    if (!editor) {
-        return false;
+    if (const TextPane* pane = FocusedPane()) {
+        return name == "EditSelectAll" || (name == "EditCopy" && pane->HasSelection());
     }
-    const bool selection = editor->textCursor().hasSelection();
-    if (name == "EditCopy") {
-        return selection;
-    }
-    if (name == "EditSelectAll") {
-        return true;
-    }
-    if (editor->isReadOnly()) {
-        return false;
-    }
-    return name == "EditPaste" || name == "EditUndo" ? true : selection;
+    return false;
 }
 
 void DoEditItem(const std::string& name) {
@@ -51,19 +41,11 @@ void DoEditItem(const std::string& name) {
         list->CopySelection();
         return;
     }
-    QPlainTextEdit* editor = FocusedEditor();
+    TextPane* pane = FocusedPane();
     if (name == "EditCopy") {
-        editor->copy();
+        pane->Copy();
     } else if (name == "EditSelectAll") {
-        editor->selectAll();
-    } else if (name == "EditCut") {
-        editor->cut();
-    } else if (name == "EditPaste") {
-        editor->paste();
-    } else if (name == "EditUndo") {
-        editor->undo();
-    } else if (name == "EditClear") {
-        editor->textCursor().removeSelectedText();
+        pane->SelectAll();
     }
 }
 
