@@ -77,7 +77,7 @@ void RowStore::SetField(size_t row, int field, std::string_view text) {
     if (inLastChunk && last.bytes.get() + last.used - start == static_cast<ptrdiff_t>(rest) &&
         last.used + kMaxLengthBytes + text.size() <= last.size) {
         char* out = PutLength(last.bytes.get() + (last.used - rest), text.size());
-        std::memcpy(out, text.data(), text.size());
+        std::copy(text.begin(), text.end(), out);  // an empty view may have no data at all
         std::memset(out + text.size(), 0, rest - 1);
         last.used = static_cast<size_t>(out - last.bytes.get()) + text.size() + rest - 1;
         return;
@@ -136,7 +136,7 @@ uint64_t RowStore::Append(std::string_view record) {
     }
     Chunk& chunk = chunks_.back();
     const uint64_t place = (static_cast<uint64_t>(chunks_.size() - 1) << 32) | chunk.used;
-    std::memcpy(chunk.bytes.get() + chunk.used, record.data(), record.size());
+    std::copy(record.begin(), record.end(), chunk.bytes.get() + chunk.used);
     chunk.used += record.size();
     return place;
 }
