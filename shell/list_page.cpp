@@ -24,17 +24,18 @@ void Window1::PagePanel1_Change(PagePanel& sender) {
         db = New<SQLiteDatabase>();
         Ref<RecordSet> rows = OpenStore(*db, kListQuery);
         if (rows) {
-            Listbox1()->DeleteAllRows();
+            // Once the window is gone, the list raises at its next use.
+            Ref<Listbox> list = Listbox1();
+            list->DeleteAllRows();
             do {
-                Ref<Listbox> list = Listbox1();
                 list->AddRow();
+                const long long row = list->LastIndex();
                 const std::string readValue = ListReadValue(*rows->Field("results"));
-                list->SetCell(list->LastIndex(), 0, *rows->Field("datetime"));
-                list->SetCell(list->LastIndex(), 1, *rows->Field("document"));
-                list->SetCell(list->LastIndex(), 2, readValue);
-                list->SetCell(list->LastIndex(), 3, *rows->Field("grade"));
-                list->SetRowTag(list->LastIndex(),
-                                StringToVariant(rows->Field("id")->StringValue()));
+                list->SetCell(row, 0, *rows->Field("datetime"));
+                list->SetCell(row, 1, *rows->Field("document"));
+                list->SetCell(row, 2, readValue);
+                list->SetCell(row, 3, *rows->Field("grade"));
+                list->SetRowTag(row, StringToVariant(rows->Field("id")->StringValue()));
                 rows->MoveNext();
                 RuntimeBackgroundTask();
             } while (!rows->Eof());
