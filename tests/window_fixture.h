@@ -59,6 +59,13 @@ class WindowTest : public RootedTest {
         return Pixel(View(window).viewport(), 120, row * 25 + 12);
     }
     static QRgb Rgb(Color color) { return qRgb(Red(color), Green(color), Blue(color)); }
+    // A control as the window shows it, with what lies beneath it.
+    static QImage Shown(const Ref<class Window1>& window, const Control& control) {
+        ProcessEvents();
+        return window->Client()
+            ->grab(QRect(control.Left(), control.Top(), control.Width(), control.Height()))
+            .toImage();
+    }
     std::vector<std::string> Column(const Ref<class Window1>& window, int column) {
         std::vector<std::string> cells;
         auto list = window->Listbox1();
