@@ -10,10 +10,13 @@ namespace {
 
 class ListPageTest : public WindowTest {};
 
+// The store's columns are found by name, in any order and beside others.
 TEST_F(ListPageTest, StartUpShowsTheStoredRowsInTheirColumns) {
     Store({Result("1", "Box.ai"),
            {"2", std::nullopt, std::nullopt, std::nullopt, "Code is UPC A\rCode reads 0361"},
-           {"3", "2018", "Odd.pdf", "F", "No barcode here"}});
+           {"3", "2018", "Odd.pdf", "F", "No barcode here"}},
+          "create table results_store (results text, extra int, grade text, document text, id "
+          "text, datetime text)");
     auto window = StartUp();
     auto list = window->Listbox1();
     ASSERT_EQ(list->ListCount(), 3);
