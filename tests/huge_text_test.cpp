@@ -75,26 +75,11 @@ TEST_F(HugeTextTest, SelectAllAndCopyTakeAWholeBlock) {
     EXPECT_TRUE(QGuiApplication::clipboard()->text().toStdString() == block);
 }
 
-struct ShownCase {
-    friend void PrintTo(const ShownCase& c, std::ostream* os) { *os << c.name; }
-    const char* name;
-    std::string text;
-    size_t limit;
-    QString shown;
-};
-
-class ShownTextTest : public ::testing::TestWithParam<ShownCase> {};
-
-TEST_P(ShownTextTest, KeepsWholeCharactersUpToTheLimit) {
-    EXPECT_EQ(ShownLines(GetParam().text, GetParam().limit), GetParam().shown);
+// A shown text keeps whole characters up to its limit, and its lines end in line feeds.
+TEST(ShownText, KeepsWholeCharactersUpToTheLimit) {
+    EXPECT_EQ(ShownLines("abcd", 3), QString("abc") + QChar(0x2026));
+    EXPECT_EQ(ShownLines("a\xC3\xA9\xC3\xA9", 4), QString("a") + QChar(0xE9) + QChar(0x2026));
+    EXPECT_EQ(ShownLines("a\rb\r\nc", 10), "a\nb\nc");
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Texts, ShownTextTest,
-    ::testing::Values(ShownCase{"Cut", "abcd", 3, QString("abc") + QChar(0x2026)},
-                      ShownCase{"CutBeforeACharacter", "a\xC3\xA9\xC3\xA9", 4,
-                                QString("a") + QChar(0xE9) + QChar(0x2026)},
-                      ShownCase{"LinesEndInLineFeeds", "a\rb\r\nc", 10, "a\nb\nc"}),
-    [](const auto& info) { return std::string(info.param.name); });
 
 }  // namespace
