@@ -110,6 +110,7 @@ TEST_F(KeyboardTest, CopyPutsTheHeadingLineAndTheSelectedRowOnTheClipboard) {
     auto window = StartFocused();
     auto* copy = InMenuBar<QAction>(window, "EditCopy");
     ASSERT_NE(copy, nullptr);
+    EXPECT_EQ(copy->shortcut(), QKeySequence(QKeySequence::Copy));
     auto offered = [copy] {
         emit static_cast<QMenu*>(copy->parent())->aboutToShow();
         const bool enabled = copy->isEnabled();
