@@ -19,11 +19,6 @@ constexpr double kReadable = 4.5;
 
 class AppearanceTest : public WindowTest {
   protected:
-    void TearDown() override {
-        SetAppearanceForTesting(Appearance::Light);
-        ProcessEvents();
-        WindowTest::TearDown();
-    }
     // The inside of a text pane, without its frame and scrollbar.
     static QImage Inside(const TextArea& pane) {
         ProcessEvents();
@@ -35,15 +30,20 @@ class AppearanceTest : public WindowTest {
     }
 };
 
-// Opened in the light (the fixture's default) the window is white; each change recolours it
-// and the list's stripes, the selected row still shows, and every text takes the appearance's
-// colours as the framework paints stored solid black text and a white ground: on the report
-// page, the list page and the installation page.
+// Opened in the light (the fixture's default) the window is white; each change recolours it,
+// the list's stripes and the segments, the selected row still shows, and every text takes the
+// appearance's colours as the framework paints stored solid black text and a white ground: on
+// the report page, the list page and the installation page.
 TEST_F(AppearanceTest, EachChangeRecoloursTheWindowTheStripesAndEveryText) {
     Store({{"1", "2018", "Box.ai", "A", demo::ReportText(demo::Layout::A, "42", "EAN 8", 3)},
            {"2", "2019", "Jar.ai", "B", "Code reads 7"},
            {"3", "", "", "A", ""}});
     auto window = StartUp();
+    const auto segments =
+        window->MainTabs()->Widget()->findChildren<QPushButton*>(Qt::FindDirectChildrenOnly);
+    ASSERT_EQ(segments.size(), 2);
+    QPushButton* chosen = segments[1];
+    const QPoint ring(3, chosen->height() / 2);  // inside the border, left of the title
     DoubleClickRow(window, 0);
     ASSERT_EQ(window->PagePanel1()->Value(), 2);
     for (auto appearance :
@@ -78,40 +78,27 @@ TEST_F(AppearanceTest, EachChangeRecoloursTheWindowTheStripesAndEveryText) {
         EXPECT_NE(Stripe(window, 2), dark ? qRgb(22, 22, 22) : qRgb(237, 243, 254))
             << "the selected row is marked";
         window->Listbox1()->SetListIndex(-1);
+
+        // The segments take the palette's colours at each paint; the chosen one's title and
+        // focus ring read on its ground.
+        const QImage other = segments[0]->grab().toImage();
+        EXPECT_EQ(Ground(other), desktop.color(QPalette::Button).rgb());
+        ExpectReadable(other, "Installation");
+        ASSERT_TRUE(chosen->isChecked());
+        chosen->clearFocus();
+        const QImage plain = chosen->grab().toImage();
+        ExpectReadable(plain, "Verification Results");
+        EXPECT_EQ(plain.pixel(ring) | 0xFF000000u, Ground(plain));
+        chosen->setFocus(Qt::TabFocusReason);
+        EXPECT_GE(Contrast(chosen->grab().toImage().pixel(ring), Ground(plain)), kReadable)
+            << "the focus ring shows";
+
         window->PagePanel1()->SetValue(0);
         ExpectReadable(Shown(window, *window->Label1()), "Label1");
         const QImage disabled = Shown(window, *window->Label2());
         EXPECT_EQ(Ink(disabled, Ground(disabled)),
                   desktop.color(QPalette::Disabled, QPalette::WindowText).rgb())
             << "a disabled label is greyed as the desktop greys it";
-    }
-}
-
-// The segments take the palette's colours at each paint, so they follow each change both ways;
-// the chosen one's title and focus ring read on its ground.
-TEST_F(AppearanceTest, TheSegmentsFollowEachChangeAndShowTheirFocus) {
-    auto window = StartUp();
-    const auto segments =
-        window->MainTabs()->Widget()->findChildren<QPushButton*>(Qt::FindDirectChildrenOnly);
-    ASSERT_EQ(segments.size(), 2);
-    QPushButton* chosen = segments[1];
-    ASSERT_TRUE(chosen->isChecked());
-    const QPoint ring(3, chosen->height() / 2);  // inside the border, left of the title
-    for (auto appearance : {Appearance::Dark, Appearance::Light}) {
-        SetAppearanceForTesting(appearance);
-        ProcessEvents();
-        const QImage other = segments[0]->grab().toImage();
-        EXPECT_EQ(Ground(other), QApplication::palette().color(QPalette::Button).rgb());
-        ExpectReadable(other, "Installation");
-        chosen->clearFocus();
-        const QImage plain = chosen->grab().toImage();
-        const QRgb ground = Ground(plain);
-        ExpectReadable(plain, "Verification Results");
-        EXPECT_EQ(plain.pixel(ring) | 0xFF000000u, ground);
-
-        chosen->setFocus(Qt::TabFocusReason);
-        const QImage focused = chosen->grab().toImage();
-        EXPECT_GE(Contrast(focused.pixel(ring), ground), kReadable) << "the focus ring shows";
     }
 }
 

@@ -49,8 +49,6 @@ class LongReadTest : public WindowTest {
     void TearDown() override {
         SQLiteDatabase::SetQuietLimitForTesting(std::chrono::seconds(30));
         SetMemoryBoundForTesting(0);
-        SetYieldPaintObserverForTesting(nullptr);
-        SetYieldIntervalForTesting(std::chrono::milliseconds(50));
         WindowTest::TearDown();
     }
 

@@ -65,7 +65,6 @@ TEST_F(KeyboardTest, TheFocusedListRingsItsCurrentRowWhichTheFirstDownChooses) {
         window->Close();
         ProcessEvents();
     }
-    SetAppearanceForTesting(Appearance::Light);
 }
 
 // A page that comes into view takes the focus at its first control in the keyboard order when

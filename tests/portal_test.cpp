@@ -80,8 +80,6 @@ class PortalTest : public WindowTest {
   protected:
     void TearDown() override {
         PrivateSessionBus::settings->scheme = kNoPreference;
-        SetAppearanceForTesting(Appearance::Light);
-        ProcessEvents();
         WindowTest::TearDown();
     }
     bool WaitForBackColor(const Ref<class Window1>& window, bool dark) {

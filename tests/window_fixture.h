@@ -8,6 +8,8 @@
 #include <QTest>
 
 #include "demo/demo_tree.h"
+#include "platform/runtime/appearance.h"
+#include "platform/runtime/yield.h"
 #include "shell/startup.h"
 #include "shell/window1.h"
 #include "support.h"
@@ -21,6 +23,14 @@ inline demo::StoredResult Result(const std::string& id, const std::string& docum
 
 class WindowTest : public RootedTest {
   protected:
+    // What a test may have changed: the appearance, while its window stands, and the yield.
+    void TearDown() override {
+        SetAppearanceForTesting(Appearance::Light);
+        SetYieldIntervalForTesting(std::chrono::milliseconds(50));
+        SetYieldPaintObserverForTesting(nullptr);
+        ProcessEvents();
+        RootedTest::TearDown();
+    }
     // The start-up that the event loop would run, without the loop.
     Ref<class Window1> StartUp() {
         _EarlyStartup();

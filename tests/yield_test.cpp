@@ -28,12 +28,6 @@ std::vector<demo::StoredResult> Results(int count) {
 
 class YieldTest : public WindowTest {
   protected:
-    void TearDown() override {
-        SetYieldIntervalForTesting(std::chrono::milliseconds(50));
-        SetYieldPaintObserverForTesting(nullptr);
-        WindowTest::TearDown();
-    }
-
     // From the installation page back to the list, which reloads it.
     void Reload(const Ref<class Window1>& window) {
         window->MainTabs()->Press(0);
