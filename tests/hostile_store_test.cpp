@@ -164,8 +164,8 @@ INSTANTIATE_TEST_SUITE_P(
 // click shows no report.
 TEST_F(LongReadTest, ADoubleClickOnAnIdThatNeverEndsShowsNoReport) {
     const std::string endlessId = "' or id in (" + kEndless + "select 'x' from r where n < 0) --";
-    Store({Result("1", "Box.ai"), {endlessId, "2018", "Endless.ai", "A", "Code reads 2"}});
-    auto window = StartUp();
+    auto window =
+        StartUp({Result("1", "Box.ai"), {endlessId, "2018", "Endless.ai", "A", "Code reads 2"}});
     ASSERT_EQ(window->Listbox1()->ListCount(), 2);
     const auto [took, longestGap] = Watch([&] { DoubleClickRow(window, 1); });
     EXPECT_GE(took, kQuietLimit);

@@ -1,5 +1,5 @@
-// The real window driven by the keyboard: the list's keys and its focus, Tab to the segments,
-// Copy of a row.
+// The real window driven by the keyboard: the list's keys and its focus, the pages' focus, Tab to
+// the segments, Copy of a row.
 #include <QAbstractScrollArea>
 #include <QClipboard>
 #include <QMenu>
@@ -31,17 +31,44 @@ class KeyboardTest : public WindowTest {
     }
 };
 
-TEST_F(KeyboardTest, EndSelectsTheLastRowAndReturnOpensItsReport) {
-    Store({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin.ai")});
-    auto window = StartFocused();
+// End selects the last row and Return opens its report. A page that comes into view takes the
+// focus at its first control in the keyboard order when the focus would go out of view with the
+// page before; a text pane rings itself while focused. Tab leaves the list for the segments,
+// where Space chooses a page and the focus stays.
+TEST_F(KeyboardTest, ThroughThePagesByKeys) {
+    auto window = StartUp({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin.ai")});
+    QApplication::setActiveWindow(window->Native());
+    ASSERT_EQ(QApplication::focusWidget(), &View(window)) << "the list page, at start";
     Key(Qt::Key_Return);
     EXPECT_EQ(window->PagePanel1()->Value(), 1) << "no row selected, nothing to open";
-
     Key(Qt::Key_End);
     ASSERT_EQ(window->Listbox1()->ListIndex(), 2);
     Key(Qt::Key_Return);
     EXPECT_EQ(window->PagePanel1()->Value(), 2);
     EXPECT_EQ(window->Label6(7)->Text(), "Tin.ai");
+
+    EXPECT_EQ(QApplication::focusWidget(), window->PushButton2()->Widget());
+    auto* pane = static_cast<QAbstractScrollArea*>(window->TextArea1()->Widget());
+    const QRgb ground = Pixel(pane->viewport(), 1, 1);
+    Key(Qt::Key_Tab);
+    Key(Qt::Key_Tab);
+    ASSERT_EQ(QApplication::focusWidget(), pane);
+    EXPECT_GE(Contrast(Pixel(pane->viewport(), 1, 1), ground), 4.5) << "the pane is ringed";
+    window->PushButton2()->Push();
+    ASSERT_EQ(QApplication::focusWidget(), &View(window));
+
+    Key(Qt::Key_Tab);
+    ASSERT_TRUE(window->MainTabs()->Widget()->isAncestorOf(QApplication::focusWidget()))
+        << "Tab reaches a segment";
+    EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation");
+    Key(Qt::Key_Space);
+    EXPECT_EQ(window->PagePanel1()->Value(), 0);
+    EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation")
+        << "the focus stays on the segments that chose the page";
+    window->MainTabs()->Press(1);
+    View(window).setFocus();
+    window->MainTabs()->Press(0);
+    EXPECT_EQ(QApplication::focusWidget(), window->PushButton1()->Widget());
 }
 
 // The list that gets the focus rings its first row without choosing it; the first Down chooses
@@ -65,43 +92,6 @@ TEST_F(KeyboardTest, TheFocusedListRingsItsCurrentRowWhichTheFirstDownChooses) {
         window->Close();
         ProcessEvents();
     }
-}
-
-// A page that comes into view takes the focus at its first control in the keyboard order when
-// the focus would go out of view with the page before; a text pane rings itself while focused.
-TEST_F(KeyboardTest, TheShownPageTakesTheFocusAtItsFirstControl) {
-    Store({Result("1", "Box.ai")});
-    auto window = StartUp();
-    QApplication::setActiveWindow(window->Native());
-    EXPECT_EQ(QApplication::focusWidget(), &View(window)) << "the list page, at start";
-
-    DoubleClickRow(window, 0);
-    ASSERT_EQ(window->PagePanel1()->Value(), 2);
-    EXPECT_EQ(QApplication::focusWidget(), window->PushButton2()->Widget());
-    auto* pane = static_cast<QAbstractScrollArea*>(window->TextArea1()->Widget());
-    const QRgb ground = Pixel(pane->viewport(), 1, 1);
-    Key(Qt::Key_Tab);
-    Key(Qt::Key_Tab);
-    ASSERT_EQ(QApplication::focusWidget(), pane);
-    EXPECT_GE(Contrast(Pixel(pane->viewport(), 1, 1), ground), 4.5) << "the pane is ringed";
-
-    window->PushButton2()->Push();
-    EXPECT_EQ(QApplication::focusWidget(), &View(window));
-    window->MainTabs()->Press(0);
-    EXPECT_EQ(QApplication::focusWidget(), window->PushButton1()->Widget());
-}
-
-TEST_F(KeyboardTest, TabLeavesTheListForTheSegmentsWhichSpaceChooses) {
-    Store({Result("1", "Box.ai")});
-    auto window = StartFocused();
-    Key(Qt::Key_Tab);
-    ASSERT_TRUE(window->MainTabs()->Widget()->isAncestorOf(QApplication::focusWidget()))
-        << "Tab reaches a segment";
-    EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation");
-    Key(Qt::Key_Space);
-    EXPECT_EQ(window->PagePanel1()->Value(), 0);
-    EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation")
-        << "the focus stays on the segments that chose the page";
 }
 
 TEST_F(KeyboardTest, CopyPutsTheHeadingLineAndTheSelectedRowOnTheClipboard) {

@@ -23,9 +23,8 @@ class ReportPageTest : public WindowTest {
 };
 
 TEST_F(ReportPageTest, ADoubleClickFillsEveryValueAndBothPanes) {
-    Store({{"a", "2018-11-04 10:00", "Cereal Box Front.ai", "A", "Code reads 1"},
-           {"b", "2018-11-04 11:00", "Label 250ml Bottle.pdf", "C", kReport}});
-    auto window = StartUp();
+    auto window = StartUp({{"a", "2018-11-04 10:00", "Cereal Box Front.ai", "A", "Code reads 1"},
+                           {"b", "2018-11-04 11:00", "Label 250ml Bottle.pdf", "C", kReport}});
     DoubleClickRow(window, 1);
     EXPECT_EQ(window->PagePanel1()->Value(), 2);
     EXPECT_TRUE(window->MainTabs()->Items()[1]->Selected());
@@ -42,11 +41,9 @@ TEST_F(ReportPageTest, ADoubleClickFillsEveryValueAndBothPanes) {
 // meanwhile leaves the list and the old report.
 TEST_F(ReportPageTest, ARowThatCannotBeShownLeavesTheListAndTheOldReport) {
     const demo::StoredResult failing{"b", "", "Second.ai", "B", "Verifier\rCode reads 99"};
-    Store({{"a", "", "First.ai", "A", kReport}, failing});
-    auto window = StartUp();
+    auto window = StartUp({{"a", "", "First.ai", "A", kReport}, failing});
     Store({{"a", "", "First, second version.ai", "A", kReport}, failing});
-    DoubleClickRow(window, 0);
-    ASSERT_EQ(window->PagePanel1()->Value(), 2);
+    ASSERT_TRUE(DoubleClickRow(window, 0));
     EXPECT_EQ(window->Label6(7)->Text(), "First, second version.ai");
     const auto shown = Values(window);
     window->PushButton2()->Push();
@@ -63,18 +60,15 @@ TEST_F(ReportPageTest, ARowThatCannotBeShownLeavesTheListAndTheOldReport) {
 }
 
 TEST_F(ReportPageTest, AMissingMarkerLeavesItsValueEmptyAndABlocklessPaneFourBlanks) {
-    Store({{"n", "", "N.ai", "D", "Code is X"}});
-    auto window = StartUp();
-    DoubleClickRow(window, 0);
-    ASSERT_EQ(window->PagePanel1()->Value(), 2);
+    auto window = StartUp({{"n", "", "N.ai", "D", "Code is X"}});
+    ASSERT_TRUE(DoubleClickRow(window, 0));
     EXPECT_EQ(Values(window),
               (std::vector<std::string>{" X", "", "", "", "", "", "", "N.ai", "D"}));
     EXPECT_EQ(window->TextArea1()->Text() + "|" + window->TextArea2()->Text(), "    |    ");
 }
 
 TEST_F(ReportPageTest, AMissingColumnRaisesOutOfTheHandlerAndThePageStays) {
-    Store({{"a", "", "Doc.ai", "A", kReport}});
-    auto window = StartUp();
+    auto window = StartUp({{"a", "", "Doc.ai", "A", kReport}});
     // The same row in a table without the document column.
     Store({}, "create table results_store (id text, results text)");
     ExecSql(demo::StorePath(tree.Path()),

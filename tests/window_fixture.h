@@ -39,6 +39,11 @@ class WindowTest : public RootedTest {
         ProcessEvents();
         return Window1();
     }
+    // The same over a store of these rows.
+    Ref<class Window1> StartUp(const std::vector<demo::StoredResult>& rows) {
+        Store(rows);
+        return StartUp();
+    }
     void Store(const std::vector<demo::StoredResult>& rows,
                const std::string& schema = demo::kSchema) {
         std::filesystem::remove(demo::StorePath(tree.Path()));
@@ -52,13 +57,14 @@ class WindowTest : public RootedTest {
     QTableView& View(const Ref<class Window1>& window) {
         return *static_cast<QTableView*>(window->Listbox1()->Widget());
     }
-    // A real double click on a row of the list.
-    void DoubleClickRow(const Ref<class Window1>& window, int row) {
+    // A real double click on a row of the list; whether the report page shows then.
+    bool DoubleClickRow(const Ref<class Window1>& window, int row) {
         QTableView& view = View(window);
         ProcessEvents();
         const QRect rect = view.visualRect(view.model()->index(row, 1));
         QTest::mouseClick(view.viewport(), Qt::LeftButton, {}, rect.center());
         QTest::mouseDClick(view.viewport(), Qt::LeftButton, {}, rect.center());
+        return window->PagePanel1()->Value() == 2;
     }
     // A pixel of the widget as painted now; Stripe gives one inside a row of the list.
     QRgb Pixel(QWidget* widget, int x, int y) {
