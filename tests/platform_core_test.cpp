@@ -51,14 +51,12 @@ TEST(PropertyBlock, TheBytesAreTheDocumentedLayoutAndDecodeBack) {
     EXPECT_EQ(std::get<std::string>(entries[5].second), "ab");
 }
 
-TEST(PropertyBlock, AValueOfTheWrongTypeIsRefusedWhenBuilt) {
+// A value of the wrong type is refused when built; a truncated block raises instead of reading
+// past its end.
+TEST(PropertyBlock, WhatItCannotHoldRaises) {
     PropertyBlock block;
     EXPECT_THROW(block.Add("Width", std::string("968")), IllegalCastException);
     EXPECT_THROW(block.Add("NoSuchProperty", true), IllegalCastException);
-}
-
-TEST(PropertyBlock, ATruncatedBlockRaisesInsteadOfReadingPastItsEnd) {
-    PropertyBlock block;
     block.Add("Title", std::string("Orbelane"));
     const std::string bytes = block.Bytes();
     for (size_t cut = 1; cut < bytes.size(); ++cut) {
