@@ -78,8 +78,8 @@ struct BadStore {
     friend void PrintTo(const BadStore& c, std::ostream* os) { *os << c.name; }
     const char* name;
     void (*make)(const fs::path& store);
-    bool locked;  // another connection holds the store's exclusive lock meanwhile
-    long long leastRows, mostRows;
+    bool locked = false;  // another connection holds the store's exclusive lock meanwhile
+    long long leastRows = 0, mostRows = 0;
 };
 
 class BadStoreTest : public LongReadTest, public ::testing::WithParamInterface<BadStore> {};
@@ -128,36 +128,31 @@ void MakeCorrupt(const fs::path& store) {
 INSTANTIATE_TEST_SUITE_P(
     Stores, BadStoreTest,
     ::testing::Values(
-        BadStore{"NoFile", [](const fs::path&) {}, false, 0, 0},
-        BadStore{"EmptyTable", [](const fs::path& p) { demo::WriteStore(p, {}); }, false, 0, 0},
-        BadStore{"Folder", [](const fs::path& p) { fs::create_directory(p); }, false, 0, 0},
-        BadStore{"ZeroBytes", [](const fs::path& p) { WriteFile(p, ""); }, false, 0, 0},
-        BadStore{"Corrupt", MakeCorrupt, false, 0, 0},
+        BadStore{"NoFile", [](const fs::path&) {}},
+        BadStore{"EmptyTable", [](const fs::path& p) { demo::WriteStore(p, {}); }},
+        BadStore{"Folder", [](const fs::path& p) { fs::create_directory(p); }},
+        BadStore{"ZeroBytes", [](const fs::path& p) { WriteFile(p, ""); }},
+        BadStore{"Corrupt", MakeCorrupt},
         BadStore{"MissingTable",
-                 [](const fs::path& p) { demo::WriteStore(p, {}, "create table t (id text)"); },
-                 false, 0, 0},
+                 [](const fs::path& p) { demo::WriteStore(p, {}, "create table t (id text)"); }},
         BadStore{"LinkToNothing",
-                 [](const fs::path& p) { fs::create_symlink(p.string() + ".gone", p); }, false, 0,
-                 0},
+                 [](const fs::path& p) { fs::create_symlink(p.string() + ".gone", p); }},
         // open() of a FIFO would wait for a writer for ever, so it is refused before it is
         // opened, behind a link too.
-        BadStore{"Fifo", [](const fs::path& p) { ASSERT_EQ(mkfifo(p.c_str(), 0600), 0); }, false, 0,
-                 0},
+        BadStore{"Fifo", [](const fs::path& p) { ASSERT_EQ(mkfifo(p.c_str(), 0600), 0); }},
         BadStore{"LinkToAFifo",
                  [](const fs::path& p) {
                      ASSERT_EQ(mkfifo((p.string() + ".fifo").c_str(), 0600), 0);
                      fs::create_symlink(p.string() + ".fifo", p);
-                 },
-                 false, 0, 0},
+                 }},
         // The lock is waited for as long as the bound, and the list stays as it was.
-        BadStore{"LockedByAWriter", [](const fs::path& p) { demo::WriteStore(p, {}); }, true, 0, 0},
+        BadStore{"LockedByAWriter", [](const fs::path& p) { demo::WriteStore(p, {}); }, true},
         // Rows until the process's memory passes its bound; those read so far stay.
         BadStore{"EndlessView", [](const fs::path& p) { ExecSql(p, kEndlessView); }, false, 1000,
                  1 << 30},
         // No row ever: the statement is ended once it has given none for the quiet limit.
         BadStore{"ViewThatNeverGivesARow",
-                 [](const fs::path& p) { ExecSql(p, kEndlessView + " where n < 0"); }, false, 0,
-                 0}),
+                 [](const fs::path& p) { ExecSql(p, kEndlessView + " where n < 0"); }}),
     [](const auto& info) { return std::string(info.param.name); });
 
 // The row query joins the id in as it stands, so an id can hold a query without end: the double
