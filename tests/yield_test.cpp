@@ -14,18 +14,6 @@ namespace {
 
 constexpr int kRows = 300;
 
-// The grades repeat, so a sort by them has to keep the order of equal rows.
-std::vector<demo::StoredResult> Results(int count) {
-    std::vector<demo::StoredResult> rows;
-    for (int i = 1; i <= count; ++i) {
-        const std::string n = std::to_string(i);
-        rows.push_back({n, "2018-11-" + n, "Doc " + std::to_string(i * 7919 % count) + ".ai",
-                        std::string(1, static_cast<char>('A' + i % 4)),
-                        "Code reads " + n + "\rCode is EAN 13"});
-    }
-    return rows;
-}
-
 class YieldTest : public WindowTest {
   protected:
     // From the installation page back to the list, which reloads it.
@@ -58,9 +46,10 @@ class YieldTest : public WindowTest {
 };
 
 // Unsorted, then by the document up, then by the grade down: the heading clicked and how
-// often, twice sorting descending.
+// often, twice sorting descending. Documents and grades repeat, so a sort by them has to keep
+// the order of equal rows.
 TEST_F(YieldTest, APaintingLoadLeavesTheSameListAsAnEmptyYield) {
-    Store(Results(kRows));
+    Store(demo::InventedResults(kRows));
     auto window = StartUp();
     for (const auto& [column, clicks] : {std::pair{0, 0}, {1, 1}, {3, 2}}) {
         SCOPED_TRACE(::testing::Message() << "column " << column);
@@ -83,7 +72,7 @@ TEST_F(YieldTest, APaintingLoadLeavesTheSameListAsAnEmptyYield) {
 }
 
 TEST_F(YieldTest, RowsShowBeforeTheLoopEndsAndNoOtherHandlerIsEntered) {
-    Store(Results(kRows));
+    Store(demo::InventedResults(kRows));
     auto window = StartUp();
     window->MainTabs()->Press(0);
     ProcessEvents();
@@ -112,7 +101,7 @@ TEST_F(YieldTest, RowsShowBeforeTheLoopEndsAndNoOtherHandlerIsEntered) {
 }
 
 TEST_F(YieldTest, AClickQueuedDuringALoadActsAfterItOnce) {
-    Store(Results(kRows));
+    Store(demo::InventedResults(kRows));
     auto window = StartUp();
     int actions = 0;
     auto tabs = window->MainTabs();
