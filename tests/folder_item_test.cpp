@@ -1,7 +1,11 @@
-// File items in temporary trees: shell paths, children, order, copies and the root mapping.
+// File items in temporary trees: shell paths, children, order, copies and the root mapping; and
+// CopyFileOrFolder with no window, whose whole bundles, loops and depth the installer tests meet.
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <cstdlib>
+
+#include "installer/copy.h"
 #include "platform/core/folder_item.h"
 #include "support.h"
 
@@ -10,7 +14,15 @@ namespace fs = std::filesystem;
 
 namespace {
 
-class FolderItemTest : public RootedTest {};
+class FolderItemTest : public RootedTest {
+  protected:
+    // The item at a path below the tree.
+    Ref<FolderItem> At(const fs::path& below) const {
+        return GetFolderItem((tree.Path() / below).string(), 3);
+    }
+    fs::path src = tree.Path() / "src";
+    fs::path dst = tree.Path() / "dst";
+};
 
 TEST_F(FolderItemTest, ShellPathsRoundTrip) {
     fs::create_directories(tree.Path() / "Users/user/Library/Application Support/Adobe");
@@ -29,7 +41,7 @@ TEST_F(FolderItemTest, ShellPathsRoundTrip) {
     // Without a root, blanks and backslashes round-trip too.
     unsetenv("ORBELANE_ROOT");
     fs::create_directories(tree.Path() / "odd\\name with blank");
-    Ref<FolderItem> item = GetFolderItem((tree.Path() / "odd\\name with blank").string(), 3);
+    Ref<FolderItem> item = At("odd\\name with blank");
     EXPECT_NE(item->ShellPath().find("with\\ blank"), std::string::npos);
     EXPECT_EQ(GetFolderItem(item->ShellPath(), 1)->NativePath(), item->NativePath());
     EXPECT_TRUE(GetFolderItem(item->ShellPath(), 1)->Exists());
@@ -39,7 +51,7 @@ TEST_F(FolderItemTest, ItemsComeInNameOrderDotFilesIncluded) {
     for (const char* name : {"b", ".DS_Store", "a", "C"}) {
         WriteFile(tree.Path() / "f" / name, name);
     }
-    Ref<FolderItem> folder = GetFolderItem((tree.Path() / "f").string(), 3);
+    Ref<FolderItem> folder = At("f");
     ASSERT_EQ(folder->Count(), 4);
     std::vector<std::string> names;
     for (long long i = 1; i <= folder->Count(); ++i) {
@@ -53,45 +65,42 @@ TEST_F(FolderItemTest, ItemsComeInNameOrderDotFilesIncluded) {
 }
 
 TEST_F(FolderItemTest, CopyFileToPutsTheCopyInsideAFolderOnly) {
-    WriteFile(tree.Path() / "src/plugin.aip", "new");
-    WriteFile(tree.Path() / "dst/plugin.aip", "old");
-    Ref<FolderItem> source = GetFolderItem((tree.Path() / "src/plugin.aip").string(), 3);
-    source->CopyFileTo(GetFolderItem((tree.Path() / "dst").string(), 3));
-    EXPECT_EQ(ReadFile(tree.Path() / "dst/plugin.aip"), "new");
+    WriteFile(src / "plugin.aip", "new");
+    WriteFile(dst / "plugin.aip", "old");
+    Ref<FolderItem> source = At("src/plugin.aip");
+    source->CopyFileTo(At("dst"));
+    EXPECT_EQ(ReadFile(dst / "plugin.aip"), "new");
     // Into a stray file nothing is written, and nothing raised; into a missing folder is met on
     // the installation page.
     WriteFile(tree.Path() / "DC/Plug-ins", "a stray file");
-    source->CopyFileTo(GetFolderItem((tree.Path() / "DC/Plug-ins").string(), 3));
+    source->CopyFileTo(At("DC/Plug-ins"));
     EXPECT_EQ(ReadFile(tree.Path() / "DC/Plug-ins"), "a stray file");
 
     // A read-only copy of an earlier install is replaced as well.
-    fs::permissions(tree.Path() / "dst/plugin.aip", fs::perms::owner_read);
-    WriteFile(tree.Path() / "src/plugin.aip", "newer");
-    source->CopyFileTo(GetFolderItem((tree.Path() / "dst").string(), 3));
-    EXPECT_EQ(ReadFile(tree.Path() / "dst/plugin.aip"), "newer");
+    fs::permissions(dst / "plugin.aip", fs::perms::owner_read);
+    WriteFile(src / "plugin.aip", "newer");
+    source->CopyFileTo(At("dst"));
+    EXPECT_EQ(ReadFile(dst / "plugin.aip"), "newer");
 }
 
 // An item that can't be read would be skipped without a trace: the copy raises instead, and
 // writes nothing. Root reads any file, so an unreadable file is tried by others only.
 TEST_F(FolderItemTest, CopyFileToRaisesOnAnUnreadableItemAndWritesNothing) {
-    fs::create_directories(tree.Path() / "src");
-    fs::create_directories(tree.Path() / "dst");
-    const fs::path link = tree.Path() / "src/link", fifo = tree.Path() / "src/fifo";
+    fs::create_directories(src);
+    fs::create_directories(dst);
+    const fs::path link = src / "link", fifo = src / "fifo";
     fs::create_symlink("gone", link);
     ASSERT_EQ(mkfifo(fifo.c_str(), 0600), 0);
     std::vector<fs::path> items = {link, fifo};
     if (geteuid() != 0) {
-        items.push_back(tree.Path() / "src/secret");
+        items.push_back(src / "secret");
         WriteFile(items.back(), "secret");
         fs::permissions(items.back(), fs::perms::none);
     }
     for (const fs::path& item : items) {
-        EXPECT_THROW(GetFolderItem(item.string(), 3)
-                         ->CopyFileTo(GetFolderItem((tree.Path() / "dst").string(), 3)),
-                     IOException)
-            << item;
+        EXPECT_THROW(GetFolderItem(item.string(), 3)->CopyFileTo(At("dst")), IOException) << item;
     }
-    EXPECT_TRUE(fs::is_empty(tree.Path() / "dst"));
+    EXPECT_TRUE(fs::is_empty(dst));
 }
 
 TEST_F(FolderItemTest, CreateAsFolderRaisesOnlyWhereSomethingElseStands) {
@@ -101,15 +110,51 @@ TEST_F(FolderItemTest, CreateAsFolderRaisesOnlyWhereSomethingElseStands) {
     WriteFile(tree.Path() / "Plug-ins/Quilbrant.aip", "a leftover");
     fs::create_symlink("gone", tree.Path() / "Plug-ins/Ostrelin.acroplugin");
     fs::create_directories(tree.Path() / "Plug-ins/Folder");
-    auto at = [&](const char* path) { return GetFolderItem((tree.Path() / path).string(), 3); };
-    EXPECT_THROW(at("Plug-ins/Quilbrant.aip")->CreateAsFolder(), IOException);
-    EXPECT_THROW(at("Plug-ins/Ostrelin.acroplugin")->CreateAsFolder(), IOException);
+    EXPECT_THROW(At("Plug-ins/Quilbrant.aip")->CreateAsFolder(), IOException);
+    EXPECT_THROW(At("Plug-ins/Ostrelin.acroplugin")->CreateAsFolder(), IOException);
     EXPECT_EQ(ReadFile(tree.Path() / "Plug-ins/Quilbrant.aip"), "a leftover");
-    at("Plug-ins/Folder")->CreateAsFolder();  // where a folder stands, nothing happens
-    at("Missing/Folder")->CreateAsFolder();
-    at("Plug-ins/Quilbrant.aip/Contents")->CreateAsFolder();
+    At("Plug-ins/Folder")->CreateAsFolder();  // where a folder stands, nothing happens
+    At("Missing/Folder")->CreateAsFolder();
+    At("Plug-ins/Quilbrant.aip/Contents")->CreateAsFolder();
     EXPECT_FALSE(fs::exists(tree.Path() / "Missing"));  // no parent: no folder, no exception
     EXPECT_TRUE(GetFolderItem(tree.Path().string(), 3)->Child("").IsNil());
+}
+
+// The same folder twice, but side by side and not on one path, is no loop.
+TEST_F(FolderItemTest, CopyingTheSameFolderLinkedTwiceSideBySideIsNoLoop) {
+    WriteFile(tree.Path() / "shared/s.txt", "s");
+    fs::create_directories(src / "P.plugin");
+    fs::create_directory_symlink(tree.Path() / "shared", src / "P.plugin/one");
+    fs::create_directory_symlink(tree.Path() / "shared", src / "P.plugin/two");
+    fs::create_directories(dst);
+    CopyFileOrFolder(At("src/P.plugin"), At("dst"));
+    EXPECT_EQ(ReadFile(dst / "P.plugin/one/s.txt"), "s");
+    EXPECT_EQ(ReadFile(dst / "P.plugin/two/s.txt"), "s");
+}
+
+// A Plug-ins folder that refuses new items, met by a user without the rights to write there:
+// the copy returns without raising and leaves nothing, so the install's copy check tells the
+// user to check their access. Root may write anywhere, so the check runs as nobody.
+TEST_F(FolderItemTest, AFolderThatRefusesTheCopyIsASilentFailure) {
+    WriteFile(src / "P.plugin/Contents/a.txt", "a");
+    fs::create_directories(dst / "Plug-ins");
+    fs::permissions(tree.Path(), fs::perms::owner_all | fs::perms::group_exec |
+                                     fs::perms::others_read | fs::perms::others_exec);
+    fs::permissions(dst / "Plug-ins", fs::perms::owner_read | fs::perms::owner_exec |
+                                          fs::perms::others_read | fs::perms::others_exec);
+    EXPECT_EXIT(
+        {
+            if (geteuid() == 0 && (setgid(65534) != 0 || setuid(65534) != 0)) {
+                std::_Exit(3);
+            }
+            try {
+                CopyFileOrFolder(At("src/P.plugin"), At("dst/Plug-ins"));
+            } catch (const RuntimeException&) {
+                std::_Exit(1);
+            }
+            std::_Exit(fs::exists(dst / "Plug-ins/P.plugin") ? 2 : 0);
+        },
+        ::testing::ExitedWithCode(0), "");
 }
 
 }  // namespace

@@ -1,6 +1,6 @@
 // The read side of the results store on real SQLite files: a WAL store, numbers and blobs,
 // hostile ids, and a store that is never written. Stores that end the read early are met on
-// the window in hostile_store_test and long_read_test.
+// the window in hostile_store_test.
 #include <algorithm>
 
 #include "demo/demo_tree.h"
