@@ -3,6 +3,8 @@
 #include <QClipboard>
 #include <QLabel>
 
+#include <algorithm>
+
 #include "platform/widgets/shown_text.h"
 #include "window_fixture.h"
 
@@ -46,17 +48,7 @@ TEST_F(HugeTextTest, TheListAndThePanesHoldEveryByteAndTheCellsDrawAPrefix) {
     const auto& document = static_cast<QLabel&>(*window->Label6(7)->Widget());
     EXPECT_EQ(document.text().size(), static_cast<qsizetype>(kShownInCell) + 1);
 
-    window->PushButton2()->Push();
-    EXPECT_EQ(list->ListCount(), 3) << "back on the list, the same rows";
-    EXPECT_EQ(list->Cell(1, 1).size(), kHuge);
-}
-
-// A measurements block of 3,300 bars, over 40 KB, goes whole to the clipboard by Select All
-// and Copy, its lines ended by line feeds.
-TEST_F(HugeTextTest, SelectAllAndCopyTakeAWholeBlock) {
-    auto window = StartUp({{"1", "2018-11-04", "Jar.ai", "B",
-                            demo::ReportText(demo::Layout::A, "5012345678900", "EAN 13", 3300)}});
-    ASSERT_TRUE(DoubleClickRow(window, 0));
+    // Select All and Copy take the whole block, its lines ended by line feeds.
     QWidget* pane = window->TextArea1()->Widget();
     window->Native()->activateWindow();
     pane->setFocus();
@@ -64,12 +56,13 @@ TEST_F(HugeTextTest, SelectAllAndCopyTakeAWholeBlock) {
     QGuiApplication::clipboard()->clear();
     QTest::keyClick(pane, Qt::Key_A, Qt::ControlModifier);
     QTest::keyClick(pane, Qt::Key_C, Qt::ControlModifier);
-    std::string block = "    Bar 1 660";
-    for (int bar = 2; bar <= 3300; ++bar) {
-        block += "\nBar " + std::to_string(bar) + " " + std::to_string(330 * (1 + bar % 4));
-    }
-    ASSERT_GT(block.size(), 40u << 10);
-    EXPECT_TRUE(QGuiApplication::clipboard()->text().toStdString() == block);
+    std::string copied = "    " + block;
+    std::replace(copied.begin(), copied.end(), '\r', '\n');
+    EXPECT_TRUE(QGuiApplication::clipboard()->text().toStdString() == copied);
+
+    window->PushButton2()->Push();
+    EXPECT_EQ(list->ListCount(), 3) << "back on the list, the same rows";
+    EXPECT_EQ(list->Cell(1, 1).size(), kHuge);
 }
 
 // A shown text keeps whole characters up to its limit, and its lines end in line feeds.
