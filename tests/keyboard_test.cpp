@@ -34,21 +34,41 @@ class KeyboardTest : public WindowTest {
     }
 };
 
-// End selects the last row and Return opens its report. A page that comes into view takes the
-// focus at its first control in the keyboard order when the focus would go out of view with the
-// page before; a text pane rings itself while focused. Tab leaves the list for the segments,
-// where Space chooses a page and the focus stays.
+// End selects the last row; Copy puts the heading line and that row on the clipboard, and
+// Return opens its report. A page that comes into view takes the focus at its first control in
+// the keyboard order when the focus would go out of view with the page before; a text pane
+// rings itself while focused. Tab leaves the list for the segments, where Space chooses a page
+// and the focus stays.
 TEST_F(KeyboardTest, ThroughThePagesByKeys) {
-    auto window = StartUp({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin.ai")});
+    auto window =
+        StartUp({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin\tlid.ai")});
     QApplication::setActiveWindow(window->Native());
     ASSERT_EQ(QApplication::focusWidget(), &View(window)) << "the list page, at start";
+    auto* copy = InMenuBar<QAction>(window, "EditCopy");
+    ASSERT_NE(copy, nullptr);
+    EXPECT_EQ(copy->shortcut(), QKeySequence(QKeySequence::Copy));
+    auto offered = [copy] {
+        emit static_cast<QMenu*>(copy->parent())->aboutToShow();
+        const bool enabled = copy->isEnabled();
+        emit static_cast<QMenu*>(copy->parent())->aboutToHide();
+        return enabled;
+    };
+    QApplication::clipboard()->setText("before");
+    EXPECT_FALSE(offered()) << "nothing selected";
+    Key(Qt::Key_C, Qt::ControlModifier);
+    EXPECT_EQ(QApplication::clipboard()->text(), "before");
     Key(Qt::Key_Return);
     EXPECT_EQ(window->PagePanel1()->Value(), 1) << "no row selected, nothing to open";
+
     Key(Qt::Key_End);
     ASSERT_EQ(window->Listbox1()->ListIndex(), 2);
+    EXPECT_TRUE(offered());
+    Key(Qt::Key_C, Qt::ControlModifier);
+    EXPECT_EQ(QApplication::clipboard()->text().toStdString(),
+              "Date - Time\tDocument\tRead Value\tGrade\n2018-11-03\tTin lid.ai\t 3\tA\n");
     Key(Qt::Key_Return);
     EXPECT_EQ(window->PagePanel1()->Value(), 2);
-    EXPECT_EQ(window->Label6(7)->Text(), "Tin.ai");
+    EXPECT_EQ(window->Label6(7)->Text(), "Tin\tlid.ai");
 
     EXPECT_EQ(QApplication::focusWidget(), window->PushButton2()->Widget());
     auto* pane = static_cast<QAbstractScrollArea*>(window->TextArea1()->Widget());
@@ -97,30 +117,6 @@ TEST_F(KeyboardTest, TheFocusedListRingsItsCurrentRowWhichTheFirstDownChooses) {
     }
 }
 
-TEST_F(KeyboardTest, CopyPutsTheHeadingLineAndTheSelectedRowOnTheClipboard) {
-    Store({Result("1", "Box.ai"), Result("2", "Jar\tlid.ai")});
-    auto window = StartFocused();
-    auto* copy = InMenuBar<QAction>(window, "EditCopy");
-    ASSERT_NE(copy, nullptr);
-    EXPECT_EQ(copy->shortcut(), QKeySequence(QKeySequence::Copy));
-    auto offered = [copy] {
-        emit static_cast<QMenu*>(copy->parent())->aboutToShow();
-        const bool enabled = copy->isEnabled();
-        emit static_cast<QMenu*>(copy->parent())->aboutToHide();
-        return enabled;
-    };
-    QApplication::clipboard()->setText("before");
-    EXPECT_FALSE(offered()) << "nothing selected";
-    Key(Qt::Key_C, Qt::ControlModifier);
-    EXPECT_EQ(QApplication::clipboard()->text(), "before");
-
-    Key(Qt::Key_End);
-    EXPECT_TRUE(offered());
-    Key(Qt::Key_C, Qt::ControlModifier);
-    EXPECT_EQ(QApplication::clipboard()->text().toStdString(),
-              "Date - Time\tDocument\tRead Value\tGrade\n2018-11-02\tJar lid.ai\t 2\tA\n");
-}
-
 class AccessibilityTest : public WindowTest {
   protected:
     static QAccessibleInterface& Spoken(QWidget* widget) {
@@ -133,8 +129,11 @@ class AccessibilityTest : public WindowTest {
     }
 };
 
-TEST_F(AccessibilityTest, TheSegmentsArePageTabsOfWhichOneIsSelected) {
-    auto window = StartUp();
+// The segments are page tabs of which one is selected, and a screen reader presses a tab as a
+// user clicks it. The panes are named by their tabs, and each value of the report is labelled
+// by the caption at its height; the centred line has none.
+TEST_F(AccessibilityTest, TheSegmentsThePanesAndTheValuesAreSpoken) {
+    auto window = StartUp({Result("1", "Box.ai")});
     QWidget* row = window->MainTabs()->Widget();
     EXPECT_EQ(Spoken(row).role(), QAccessible::PageTabList);
     const auto segments = row->findChildren<QPushButton*>(Qt::FindDirectChildrenOnly);
@@ -150,22 +149,11 @@ TEST_F(AccessibilityTest, TheSegmentsArePageTabsOfWhichOneIsSelected) {
     EXPECT_EQ(Name(segments[0]), "Installation");
     EXPECT_EQ(Name(segments[1]), "Verification Results");
 
-    // A screen reader presses a tab as a user clicks it.
-    Spoken(segments[0]).actionInterface()->doAction(QAccessibleActionInterface::pressAction());
-    EXPECT_EQ(window->PagePanel1()->Value(), 0);
-    EXPECT_TRUE(Spoken(segments[0]).state().selected);
-    EXPECT_FALSE(Spoken(segments[1]).state().selected);
-}
-
-// Each value of the report is labelled by the caption at its height; the centred line has none.
-TEST_F(AccessibilityTest, ThePanesAreNamedByTheirTabsAndEachValueByItsCaption) {
-    auto window = StartUp({Result("1", "Box.ai")});
     ASSERT_TRUE(DoubleClickRow(window, 0));
     EXPECT_EQ(Name(window->TextArea1()->Widget()), "Measurements");
     EXPECT_TRUE(Spoken(window->TextArea1()->Widget()).state().readOnly) << "a text to read";
     window->TabPanel1()->SetValue(1);
     EXPECT_EQ(Name(window->TextArea2()->Widget()), "Deviances");
-
     const std::vector<std::pair<long long, long long>> captionOfValue = {
         {6, 7}, {0, 0}, {1, 1}, {2, 2}, {3, 3}, {4, 4}, {5, 5}, {7, 8}};
     for (const auto& [caption, value] : captionOfValue) {
@@ -175,6 +163,11 @@ TEST_F(AccessibilityTest, ThePanesAreNamedByTheirTabsAndEachValueByItsCaption) {
                   window->Label5(caption)->Text());
     }
     EXPECT_TRUE(Spoken(window->Label6(6)->Widget()).relations(QAccessible::Label).isEmpty());
+
+    Spoken(segments[0]).actionInterface()->doAction(QAccessibleActionInterface::pressAction());
+    EXPECT_EQ(window->PagePanel1()->Value(), 0);
+    EXPECT_TRUE(Spoken(segments[0]).state().selected);
+    EXPECT_FALSE(Spoken(segments[1]).state().selected);
 }
 
 }  // namespace
