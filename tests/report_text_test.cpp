@@ -65,18 +65,17 @@ TEST(ReportText, CrLfCarriesTheLineFeedIntoLineEightAndTheBlocks) {
 }
 
 TEST(ReportText, MissingAndReversedBlockMarkers) {
-    const std::string noMeasurements = "Code reads 1\rBar/Space Deviances = +- mic 0\rBar 1 +4";
-    EXPECT_EQ(MeasurementsBlock(noMeasurements), "");
-    EXPECT_EQ(DeviancesBlock(noMeasurements), "\rBar 1 +4");
-
-    const std::string noDeviances = "Code reads 1\rActual Measurements = +- mic 0\rBar 1 330";
-    EXPECT_EQ(MeasurementsBlock(noDeviances), "\rBar 1 330");
-    EXPECT_EQ(DeviancesBlock(noDeviances), "");
-
-    const std::string reversed =
-        "x\rBar/Space Deviances = +- mic 0\rD\rActual Measurements = +- mic 0\rM";
-    EXPECT_EQ(MeasurementsBlock(reversed), "\rM");
-    EXPECT_EQ(DeviancesBlock(reversed), "\rD\rActual Measurements = +- mic 0\rM");
+    const std::string m = "Actual Measurements = +- mic 0", d = "Bar/Space Deviances = +- mic 0";
+    const std::string cases[][3] = {
+        // The text, its measurements block and its deviances block.
+        {"Code reads 1\r" + d + "\rBar 1 +4", "", "\rBar 1 +4"},
+        {"Code reads 1\r" + m + "\rBar 1 330", "\rBar 1 330", ""},
+        {"x\r" + d + "\rD\r" + m + "\rM", "\rM", "\rD\r" + m + "\rM"},
+    };
+    for (const auto& [text, measurements, deviances] : cases) {
+        EXPECT_EQ(MeasurementsBlock(text), measurements) << text;
+        EXPECT_EQ(DeviancesBlock(text), deviances) << text;
+    }
 }
 
 }  // namespace

@@ -13,10 +13,6 @@ namespace {
 
 class StoreTest : public RootedTest {
   protected:
-    void Write(const std::vector<demo::StoredResult>& rows,
-               const std::string& schema = demo::kSchema) {
-        demo::WriteStore(store, rows, schema);
-    }
     int Rows(const std::string& statement) {
         SQLiteDatabase db;
         auto rows = OpenStore(db, statement);
@@ -34,7 +30,7 @@ class StoreTest : public RootedTest {
 // that SQLite puts beside it with an empty -wal; the store itself is never written. Read while
 // the writer has it open, the rows in the writer's log count too.
 TEST_F(StoreTest, AStoreInWalModeIsReadWithoutWritingIt) {
-    Write(demo::InventedResults(3));
+    demo::WriteStore(store, demo::InventedResults(3));
     ExecSql(store, "pragma journal_mode=wal");
     const std::string before = ReadFile(store);
     EXPECT_EQ(Rows(kListQuery), 3);
@@ -59,7 +55,7 @@ TEST_F(StoreTest, AStoreInWalModeIsReadWithoutWritingIt) {
 // A field is a view of its row until the cursor moves; one still held keeps its own text. A
 // record set outlives its database.
 TEST_F(StoreTest, FieldsAndRecordSetsOutliveWhatTheyCameFrom) {
-    Write(demo::InventedResults(3, false));
+    demo::WriteStore(store, demo::InventedResults(3, false));
     Ref<RecordSet> rows;
     {
         SQLiteDatabase db;
@@ -79,7 +75,9 @@ TEST_F(StoreTest, FieldsAndRecordSetsOutliveWhatTheyCameFrom) {
 }
 
 TEST_F(StoreTest, NumbersAndBlobsReadAsText) {
-    Write({}, "create table results_store (id integer primary key, datetime real, results blob)");
+    demo::WriteStore(
+        store, {},
+        "create table results_store (id integer primary key, datetime real, results blob)");
     ExecSql(store, "insert into results_store values (12, 2.5, x'436f6465')");
     SQLiteDatabase db;
     auto rows = OpenStore(db, RowQuery("12"));
@@ -93,7 +91,7 @@ TEST_F(StoreTest, NumbersAndBlobsReadAsText) {
 }
 
 TEST_F(StoreTest, HostileIdsEndTheReadAndRunNothingElse) {
-    Write(demo::InventedResults(5, false));
+    demo::WriteStore(store, demo::InventedResults(5, false));
     const std::string before = ReadFile(store);
     EXPECT_EQ(Rows(RowQuery("it's")), 0);
     EXPECT_EQ(Rows(RowQuery("x'; delete from results_store; --")), 0);
@@ -104,7 +102,7 @@ TEST_F(StoreTest, HostileIdsEndTheReadAndRunNothingElse) {
 }
 
 TEST_F(StoreTest, SQLSelectRunsExactlyOneReadingStatement) {
-    Write(demo::InventedResults(2, false));
+    demo::WriteStore(store, demo::InventedResults(2, false));
     SQLiteDatabase db;
     db.DatabaseFile = GetFolderItem(kResultsStorePath, 1);
     ASSERT_TRUE(db.Connect());
