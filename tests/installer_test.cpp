@@ -2,12 +2,12 @@
 // message that was shown and the files that stand afterwards.
 #include <unistd.h>
 
+#include <algorithm>
 #include <cstdio>
 
 #include <QAbstractItemView>
 #include <QComboBox>
 
-#include "installer/plugin_folders.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -22,8 +22,7 @@ class InstallerTest : public WindowTest {
   protected:
     void SetUp() override {
         SetResourcesFolderForTesting(resources);
-        MakePlugin(resources / "Quilbrant.aip");
-        MakePlugin(resources / "Ostrelin.acroplugin");
+        Reset(true);
     }
     void TearDown() override {
         SetResourcesFolderForTesting({});
@@ -36,8 +35,15 @@ class InstallerTest : public WindowTest {
         fs::create_directories(bundle / "Contents/Resources/empty");
     }
     fs::path Data() const { return demo::ApplicationDataPath(tree.Path()); }
-    fs::path Illustrator(const std::string& version) const {
-        return Data() / "Adobe" / ("Adobe Illustrator " + version);
+    // Nothing below application data or in /Applications; the plug-ins in the resources or not.
+    void Reset(bool sources) {
+        fs::remove_all(Data());
+        fs::remove_all(tree.Path() / "Applications");
+        fs::remove_all(resources);
+        if (sources) {
+            MakePlugin(resources / "Quilbrant.aip");
+            MakePlugin(resources / "Ostrelin.acroplugin");
+        }
     }
     // Selects the row and presses "Install Now"; returns the one message shown.
     std::string Press(Row row) {
@@ -50,6 +56,15 @@ class InstallerTest : public WindowTest {
         EXPECT_LE(log.messages.size(), 1u);
         return log.messages.empty() ? std::string() : log.messages.front();
     }
+    // Every path in the tree, to tell that a press changed nothing.
+    std::vector<fs::path> Listing() const {
+        std::vector<fs::path> paths;
+        for (const auto& entry : fs::recursive_directory_iterator(tree.Path())) {
+            paths.push_back(entry.path());
+        }
+        std::sort(paths.begin(), paths.end());
+        return paths;
+    }
     bool Installed(const fs::path& folder, const char* plugin) const {
         return fs::exists(folder / plugin / "Contents/MacOS/binary") &&
                fs::exists(folder / plugin / "Contents/.signature") &&
@@ -59,106 +74,103 @@ class InstallerTest : public WindowTest {
     fs::path resources = tree.Path() / "app resources";
 };
 
-TEST_F(InstallerTest, ThePromptRowAsksForAProductAndTouchesNothing) {
-    fs::remove_all(resources);
-    StartUp();
-    EXPECT_EQ(Press(kPrompt), "Choose which version of Acrobat you are using");
-    EXPECT_FALSE(fs::exists(Data()));
-}
-
-TEST_F(InstallerTest, IllustratorInstallsIntoTheHighestNumberedFolder) {
-    fs::create_directories(Illustrator("22") / "en_US/Plug-ins");
-    fs::create_directories(Illustrator("23") / "en_US/Plug-ins");
-    WriteFile(Illustrator("23") / ".DS_Store", "");
-    StartUp();
-    EXPECT_EQ(Press(kIllustrator), "Installed please restart Illustrator");
-    EXPECT_TRUE(Installed(Illustrator("23") / "en_US/Plug-ins", "Quilbrant.aip"));
-    EXPECT_FALSE(fs::exists(Illustrator("22") / "en_US/Plug-ins/Quilbrant.aip"));
-
-    // A second install over the first installs again.
-    WriteFile(resources / "Quilbrant.aip/Contents/MacOS/binary", "version 2");
-    EXPECT_EQ(Press(kIllustrator), "Installed please restart Illustrator");
-    EXPECT_EQ(ReadFile(Illustrator("23") / "en_US/Plug-ins/Quilbrant.aip/Contents/MacOS/binary"),
-              "version 2");
-}
-
-// Every stop of the walk tells the user, even with the plug-in missing from the resources. A
-// stop ending in "/" is a folder, any other a file.
-TEST_F(InstallerTest, EveryStopOfTheWalkIsToldBeforeTheMissingSource) {
-    fs::remove_all(resources / "Quilbrant.aip");
-    StartUp();
-    for (const std::string stop : {"", "Adobe", "Adobe/Adobe Illustrator 24/",
-                                   "Adobe/Adobe Illustrator 24/en_US/Plug-ins"}) {
-        fs::remove_all(Data());
-        fs::create_directories(Data());
-        if (stop.ends_with('/')) {
-            fs::create_directories(Data() / stop);
-        } else if (!stop.empty()) {
-            WriteFile(Data() / stop, "");
-        }
-        EXPECT_EQ(Press(kIllustrator), "Could not find Illustrator plugins folder.") << stop;
-    }
-}
-
-TEST_F(InstallerTest, AcrobatXAndXIAreToldApartAndLieUnderApplications) {
-    const fs::path xi =
-        tree.Path() / "Applications/Adobe Acrobat XI Pro/Adobe Acrobat Pro.app/Contents/Plug-ins";
-    fs::create_directories(xi);
-    StartUp();
-    EXPECT_EQ(Press(kAcrobatX),
-              "There was an error copying the plugin please check you have access");
-    EXPECT_FALSE(fs::exists(tree.Path() / "Applications/Adobe Acrobat X Pro"))
-        << "the target folder is never created";
-    EXPECT_EQ(Press(kAcrobatXI), "Installed please restart Acrobat");
-    EXPECT_TRUE(Installed(xi, "Ostrelin.acroplugin"));
-}
-
-// A missing source is told once the target is settled, whatever the target.
-TEST_F(InstallerTest, AMissingResourcesFolderIsToldAsAMissingSource) {
-    fs::remove_all(resources);
-    fs::create_directories(Illustrator("26") / "en_US/Plug-ins");
-    fs::create_directories(Data() / "Adobe/Acrobat/DC/Plug-ins");
-    StartUp();
-    for (Row row : {kAcrobatX, kDivider, kIllustrator, kAcrobatDC}) {
-        EXPECT_EQ(Press(row), "Unable to install at this time") << row;
-    }
-    EXPECT_TRUE(fs::is_empty(Illustrator("26") / "en_US/Plug-ins"));
-}
-
-TEST_F(InstallerTest, TheDividerRowRaisesOnItsNilTarget) {
-    StartUp();
-    EXPECT_EQ(Press(kDivider), "Unable to install at this time 1");
-}
-
-// One install of the Acrobat DC plug-in over a tree that the user or the bundle made odd: the
-// message shown, and one item that must stand afterwards with what it holds, or must not stand.
-struct OddTree {
-    friend void PrintTo(const OddTree& c, std::ostream* os) { *os << c.name; }
-    const char* name;
-    void (*make)(const fs::path& bundle, const fs::path& product);
-    const char* message;
-    std::string item;      // below the product's folder
-    const char* contents;  // nullptr: the item must not exist
-};
-
-class OddTreeTest : public InstallerTest, public ::testing::WithParamInterface<OddTree> {};
-
-TEST_P(OddTreeTest, TellsTheUserAndLosesNothing) {
-    const fs::path product = Data() / "Adobe/Acrobat/DC";
-    fs::create_directories(product);
-    GetParam().make(resources / "Ostrelin.acroplugin", product);
-    StartUp();
-    EXPECT_EQ(Press(kAcrobatDC), GetParam().message);
-    if (GetParam().contents == nullptr) {
-        EXPECT_FALSE(fs::exists(product / GetParam().item));
-    } else {
-        EXPECT_EQ(ReadFile(product / GetParam().item), GetParam().contents);
-    }
-    EXPECT_EQ(Window1()->PagePanel1()->Value(), 0) << "the program goes on";
-}
-
 const char* const kCatchAll = "Unable to install at this time 1";
 const char* const kNoAccess = "There was an error copying the plugin please check you have access";
+const char* const kNoSource = "Unable to install at this time";
+const char* const kStop = "Could not find Illustrator plugins folder.";
+const char* const kAiDone = "Installed please restart Illustrator";
+const char* const kAcroDone = "Installed please restart Acrobat";
+const std::string kXI =
+    "/Applications/Adobe Acrobat XI Pro/Adobe Acrobat Pro.app/Contents/Plug-ins";
+const std::string kDC = "Adobe/Acrobat/DC/Plug-ins";
+const std::string k2017 = "Adobe/Acrobat/2017/Plug-ins";
+
+// Below an Illustrator folder, and its plug-ins folder.
+std::string A(const std::string& below) {
+    return "Adobe/Adobe Illustrator " + below;
+}
+std::string P(const std::string& number) {
+    return A(number + "/en_US/Plug-ins");
+}
+
+// One press on a tree: the folders made below application data (or, from "/", below the root)
+// and one file, whether the plug-ins stand in the resources, the message, and the folder that
+// then holds the plug-in; where none does, nothing at all has changed. The Illustrator rows
+// walk Adobe / the highest "Adobe Illustrator <n>" / its first sub-folder without a leading
+// "." / Plug-ins, sought by the name rebuilt from the number.
+struct PressCase {
+    Row row;
+    std::vector<std::string> folders;
+    std::string file;
+    bool sources;
+    const char* message;
+    std::string into;
+};
+
+const PressCase kPresses[] = {
+    {kPrompt, {}, "", false, "Choose which version of Acrobat you are using", ""},
+    // A row that is no product forms no target, and the copy raises on it.
+    {kDivider, {}, "", true, kCatchAll, ""},
+    {kAcrobatX, {kXI}, "", true, kNoAccess, ""},  // the target folder is never created
+    {kAcrobatXI, {kXI}, "", true, kAcroDone, kXI},
+    {kAcrobat2017, {k2017}, "", true, kAcroDone, k2017},
+    {kAcrobatDC, {kDC}, "", true, kAcroDone, kDC},
+    // A leftover or an alias of the plug-in's name where the plug-in's folder goes; a file
+    // named Plug-ins.
+    {kAcrobatDC, {}, kDC + "/Ostrelin.acroplugin", true, kCatchAll, ""},
+    {kAcrobatDC, {}, kDC, true, kNoAccess, ""},
+    // A missing source is told once the target is settled, whatever the target.
+    {kAcrobatX, {}, "", false, kNoSource, ""},
+    {kDivider, {}, "", false, kNoSource, ""},
+    {kAcrobatDC, {kDC}, "", false, kNoSource, ""},
+    {kIllustrator, {P("26")}, "", false, kNoSource, ""},
+    // Every stop of the walk tells the user, even with the plug-in missing.
+    {kIllustrator, {}, "", false, kStop, ""},
+    {kIllustrator, {}, "Adobe", false, kStop, ""},
+    {kIllustrator, {A("24")}, "", false, kStop, ""},
+    {kIllustrator, {}, P("24"), false, kStop, ""},
+    {kIllustrator, {P("22.9")}, "", true, kStop, ""},
+    {kIllustrator, {P("-5"), P("-1")}, "", true, kStop, ""},
+    {kIllustrator, {"Adobe/Adobe Illustrator/en_US/Plug-ins"}, "", true, kStop, ""},
+    // With dot files alone, Plug-ins is sought in the numbered folder itself.
+    {kIllustrator, {A("26/.hidden")}, "", true, kStop, ""},
+    {kIllustrator, {A("26/Plug-ins")}, "", true, kStop, ""},
+    {kIllustrator, {A("27/a_first"), A("27/b_second/Plug-ins")}, "", true, kStop, ""},
+    {kIllustrator, {P("22"), P("23")}, A("23/.DS_Store"), true, kAiDone, P("23")},
+    {kIllustrator, {P("CC 2018"), P("2018")}, "", true, kAiDone, P("2018")},
+    {kIllustrator, {P("Settings"), P("0")}, "", true, kAiDone, P("0")},
+    {kIllustrator, {A("25/.config/Plug-ins"), P("25")}, "", true, kAiDone, P("25")},
+};
+
+TEST_F(InstallerTest, EachRowOfTheDecisionTable) {
+    StartUp();
+    const auto below = [&](const std::string& path) {
+        return path.starts_with('/') ? tree.Path() / path.substr(1) : Data() / path;
+    };
+    for (const PressCase& c : kPresses) {
+        SCOPED_TRACE(::testing::Message() << "row " << &c - kPresses);
+        Reset(c.sources);
+        for (const std::string& folder : c.folders) {
+            fs::create_directories(below(folder));
+        }
+        if (!c.file.empty()) {
+            WriteFile(below(c.file), "");
+        }
+        const auto before = Listing();
+        EXPECT_EQ(Press(c.row), c.message);
+        if (c.into.empty()) {
+            EXPECT_EQ(Listing(), before);
+            continue;
+        }
+        // A second press over an install installs again.
+        const char* plugin = c.row == kIllustrator ? "Quilbrant.aip" : "Ostrelin.acroplugin";
+        EXPECT_TRUE(Installed(below(c.into), plugin));
+        WriteFile(resources / plugin / "Contents/MacOS/binary", "version 2");
+        EXPECT_EQ(Press(c.row), c.message);
+        EXPECT_EQ(ReadFile(below(c.into) / plugin / "Contents/MacOS/binary"), "version 2");
+    }
+}
+
 const std::string kCopied = "Plug-ins/Ostrelin.acroplugin/Contents/";
 
 std::string Deep() {
@@ -169,97 +181,97 @@ std::string Deep() {
     return deepest;
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Bundles, OddTreeTest,
-    ::testing::Values(
-        // A leftover or an alias of the plug-in's name where the plug-in's folder goes.
-        OddTree{"AFileWhereThePluginFolderGoes",
-                [](const fs::path&, const fs::path& p) {
-                    WriteFile(p / "Plug-ins/Ostrelin.acroplugin", "alias");
-                },
-                kCatchAll, "Plug-ins/Ostrelin.acroplugin", "alias"},
-        OddTree{"ADanglingLinkInTheBundle",
-                [](const fs::path& b, const fs::path& p) {
-                    fs::create_directories(p / "Plug-ins");
-                    fs::create_symlink("nowhere", b / "Contents/Resources/link");
-                },
-                kCatchAll, kCopied + "Info.plist", "<plist/>"},
-        OddTree{"ALinkLoopInTheBundle",
-                [](const fs::path& b, const fs::path& p) {
-                    fs::create_directories(p / "Plug-ins");
-                    fs::create_directory_symlink("..", b / "Contents/loop");
-                },
-                kCatchAll, kCopied + ".signature", "sig"},
-        OddTree{"ABundleTwoHundredLevelsDeep",
-                [](const fs::path& b, const fs::path& p) {
-                    fs::create_directories(p / "Plug-ins");
-                    WriteFile(b / "Contents" / Deep() / "strings", "deep");
-                },
-                "Installed please restart Acrobat", kCopied + Deep() + "/strings", "deep"},
-        OddTree{"AFileNamedPlugIns",
-                [](const fs::path&, const fs::path& p) { WriteFile(p / "Plug-ins", "a file"); },
-                kNoAccess, "Plug-ins", "a file"},
+// One install of the Acrobat DC plug-in over a tree that the user or the bundle made odd: the
+// message shown, and one item that must stand afterwards with what it holds, or must not stand.
+TEST_F(InstallerTest, AnOddTreeIsToldAndLosesNothing) {
+    const struct {
+        void (*make)(const fs::path& bundle, const fs::path& plugins);
+        const char* message;
+        std::string item;      // below the product's folder
+        const char* contents;  // nullptr: the item must not exist
+    } cases[] = {
+        {[](const fs::path& b, const fs::path&) {
+             fs::create_symlink("nowhere", b / "Contents/Resources/link");
+         },
+         kCatchAll, kCopied + "Info.plist", "<plist/>"},
+        {[](const fs::path& b, const fs::path&) {
+             fs::create_directory_symlink("..", b / "Contents/loop");
+         },
+         kCatchAll, kCopied + ".signature", "sig"},
+        {[](const fs::path& b, const fs::path&) {
+             WriteFile(b / "Contents" / Deep() / "strings", "deep");
+         },
+         kAcroDone, kCopied + Deep() + "/strings", "deep"},
         // A plug-in that is a plain file is never written in the Plug-ins folder's place.
-        OddTree{"AFilePluginWithoutAPlugInsFolder",
-                [](const fs::path& b, const fs::path&) {
-                    fs::remove_all(b);
-                    WriteFile(b, "plug-in");
-                },
-                kNoAccess, "Plug-ins", nullptr}),
-    [](const auto& info) { return std::string(info.param.name); });
-
-// A folder that the user may not list, in the bundle, as the bundle or on the Illustrator walk:
-// never "Installed", and what was copied before it stays. Root lists any folder, so the press
-// runs in a child process as nobody.
-struct Unlistable {
-    const char* name;
-    Row row;
-    std::string folder;  // made unlistable, below application data or the resources
-    std::string kept;    // below application data: copied before the folder was met, if any
-};
-
-class UnlistableTest : public InstallerTest, public ::testing::WithParamInterface<Unlistable> {};
-
-TEST_P(UnlistableTest, EndsInTheCatchAllMessage) {
-    const fs::path plugins[] = {Illustrator("24") / "en_US/Plug-ins",
-                                Data() / "Adobe/Acrobat/DC/Plug-ins"};
-    for (const fs::path& folder : plugins) {
-        fs::create_directories(folder);
-        fs::permissions(folder, fs::perms::all);
-    }
-    const std::string& folder = GetParam().folder;
-    const fs::path unlistable = folder.starts_with("Adobe") ? Data() / folder : resources / folder;
-    fs::permissions(tree.Path(), fs::perms::owner_all | fs::perms::others_exec);
-    fs::permissions(unlistable, fs::perms::none);
+        {[](const fs::path& b, const fs::path& p) {
+             fs::remove(p);
+             fs::remove_all(b);
+             WriteFile(b, "plug-in");
+         },
+         kNoAccess, "Plug-ins", nullptr},
+    };
     StartUp();
-    EXPECT_EXIT(
-        {
-            if (geteuid() == 0 && (setgid(65534) != 0 || setuid(65534) != 0)) {
-                std::_Exit(3);
-            }
-            const std::string message = Press(GetParam().row);
-            std::fprintf(stderr, "%s\n", message.c_str());
-            std::_Exit(message == kCatchAll ? 0 : 1);
-        },
-        ::testing::ExitedWithCode(0), "");
-    fs::permissions(unlistable, fs::perms::owner_all);
-    if (GetParam().kept.empty()) {
-        EXPECT_TRUE(fs::is_empty(plugins[0]) && fs::is_empty(plugins[1]));
-    } else {
-        EXPECT_TRUE(fs::exists(Data() / GetParam().kept));
+    for (const auto& c : cases) {
+        SCOPED_TRACE(::testing::Message() << "case " << &c - cases);
+        Reset(true);
+        fs::create_directories(Data() / kDC);
+        c.make(resources / "Ostrelin.acroplugin", Data() / kDC);
+        EXPECT_EQ(Press(kAcrobatDC), c.message);
+        const fs::path item = Data() / "Adobe/Acrobat/DC" / c.item;
+        if (c.contents == nullptr) {
+            EXPECT_FALSE(fs::exists(item));
+        } else {
+            EXPECT_EQ(ReadFile(item), c.contents);
+        }
     }
+    EXPECT_EQ(Window1()->PagePanel1()->Value(), 0) << "the program goes on";
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Folders, UnlistableTest,
-    ::testing::Values(
-        Unlistable{"ASubFolderOfTheBundle", kAcrobatDC, "Ostrelin.acroplugin/Contents/Resources",
-                   "Adobe/Acrobat/DC/" + kCopied + "MacOS/binary"},
-        Unlistable{"TheBundle", kIllustrator, "Quilbrant.aip",
-                   "Adobe/Adobe Illustrator 24/en_US/Plug-ins/Quilbrant.aip"},
-        Unlistable{"TheAdobeFolder", kIllustrator, "Adobe", ""},
-        Unlistable{"TheNumberedFolder", kIllustrator, "Adobe/Adobe Illustrator 24", ""}),
-    [](const auto& info) { return std::string(info.param.name); });
+// A folder that the user may not list, in the bundle, as the bundle or on the Illustrator walk:
+// never "Installed", and what was copied before it stays. Root lists any folder, so each press
+// runs in a child process as nobody.
+TEST_F(InstallerTest, AnUnlistableFolderEndsInTheCatchAllMessage) {
+    const struct {
+        Row row;
+        std::string folder;  // made unlistable, below application data or the resources
+        std::string kept;    // below application data: copied before the folder was met, if any
+    } cases[] = {
+        {kAcrobatDC, "Ostrelin.acroplugin/Contents/Resources",
+         kDC + "/Ostrelin.acroplugin/Contents/MacOS/binary"},
+        {kIllustrator, "Quilbrant.aip", P("24") + "/Quilbrant.aip"},
+        {kIllustrator, "Adobe", ""},
+        {kIllustrator, A("24"), ""},
+    };
+    StartUp();
+    fs::permissions(tree.Path(), fs::perms::owner_all | fs::perms::others_exec);
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.folder);
+        Reset(true);
+        for (const fs::path& folder : {Data() / P("24"), Data() / kDC}) {
+            fs::create_directories(folder);
+            fs::permissions(folder, fs::perms::all);
+        }
+        const fs::path unlistable =
+            c.folder.starts_with("Adobe") ? Data() / c.folder : resources / c.folder;
+        fs::permissions(unlistable, fs::perms::none);
+        EXPECT_EXIT(
+            {
+                if (geteuid() == 0 && (setgid(65534) != 0 || setuid(65534) != 0)) {
+                    std::_Exit(3);
+                }
+                const std::string message = Press(c.row);
+                std::fprintf(stderr, "%s\n", message.c_str());
+                std::_Exit(message == kCatchAll ? 0 : 1);
+            },
+            ::testing::ExitedWithCode(0), "");
+        fs::permissions(unlistable, fs::perms::owner_all);
+        if (c.kept.empty()) {
+            EXPECT_TRUE(fs::is_empty(Data() / P("24")) && fs::is_empty(Data() / kDC));
+        } else {
+            EXPECT_TRUE(fs::exists(Data() / c.kept));
+        }
+    }
+}
 
 // Return and Enter on the installation page press "Install Now" wherever the focus is; in the
 // open popup they choose a row instead.
@@ -299,80 +311,6 @@ TEST_F(InstallerTest, ReturnPressesInstallNowFromAnywhereOnThePage) {
     window->MainTabs()->Press(1);
     QTest::keyClick(client, Qt::Key_Return);
     EXPECT_TRUE(log.messages.empty()) << "no default button on the list page";
-}
-
-// The walk by itself, on the names that it meets.
-struct WalkCase {
-    friend void PrintTo(const WalkCase& c, std::ostream* os) { *os << c.name; }
-    const char* name;
-    std::vector<std::string>
-        folders;           // below Adobe; each gets en_US/Plug-ins unless it ends in "/"
-    std::string expected;  // the number of the folder whose en_US/Plug-ins is found, "" for a stop
-};
-
-class WalkTest : public ::testing::TestWithParam<WalkCase> {
-  protected:
-    TempDir tree;
-    ScopedRoot root{tree.Path()};
-};
-
-TEST_P(WalkTest, FindsTheHighestNumberedFolder) {
-    const fs::path data = demo::ApplicationDataPath(tree.Path());
-    for (const std::string& folder : GetParam().folders) {
-        if (folder.back() == '/') {
-            fs::create_directories(data / "Adobe" / folder);
-        } else {
-            fs::create_directories(data / "Adobe" / folder / "en_US/Plug-ins");
-        }
-    }
-    MessageLog log;
-    Ref<FolderItem> target = IllustratorPluginsFolder(SpecialFolder::ApplicationData());
-    if (GetParam().expected.empty()) {
-        EXPECT_TRUE(target.IsNil());
-        EXPECT_EQ(log.messages,
-                  std::vector<std::string>{"Could not find Illustrator plugins folder."});
-    } else {
-        ASSERT_FALSE(target.IsNil());
-        EXPECT_EQ(target->NativePath(),
-                  data / "Adobe" / ("Adobe Illustrator " + GetParam().expected) / "en_US/Plug-ins");
-        EXPECT_TRUE(log.messages.empty());
-    }
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Names, WalkTest,
-    ::testing::Values(
-        // The folder is sought by the name rebuilt from its number.
-        WalkCase{"TwentyTwoNineAloneStops", {"Adobe Illustrator 22.9"}, ""},
-        WalkCase{
-            "WordBeforeTheNumber", {"Adobe Illustrator CC 2018", "Adobe Illustrator 2018"}, "2018"},
-        WalkCase{"LastFieldNoNumberGivesZero",
-                 {"Adobe Illustrator Settings", "Adobe Illustrator 0"},
-                 "0"},
-        WalkCase{"NegativeNumbersDoNotCount", {"Adobe Illustrator -5", "Adobe Illustrator -1"}, ""},
-        WalkCase{"NoBlankBehindDoesNotCount", {"Adobe Illustrator"}, ""},
-        WalkCase{"DotFilesBeforeTheSubFolder",
-                 {"Adobe Illustrator 25/.hidden/", "Adobe Illustrator 25/.config/Plug-ins/",
-                  "Adobe Illustrator 25"},
-                 "25"},
-        WalkCase{"OnlyDotFilesMeansPlugInsIsSoughtInTheNumberedFolder",
-                 {"Adobe Illustrator 26/.hidden/"},
-                 ""},
-        WalkCase{
-            "PlugInsDirectlyInsideIsTakenForTheSubFolder", {"Adobe Illustrator 26/Plug-ins/"}, ""},
-        WalkCase{"TheFirstOfTwoSubFoldersIsTaken",
-                 {"Adobe Illustrator 27/a_first/", "Adobe Illustrator 27/b_second/Plug-ins/"},
-                 ""}),
-    [](const auto& info) { return std::string(info.param.name); });
-
-// X, XI and DC are met on the window above; the path of 2017 and the Nil cases are left.
-TEST(AcrobatFolders, TheRestOfThePathTable) {
-    TempDir tree;
-    ScopedRoot root{tree.Path()};
-    Ref<FolderItem> data = SpecialFolder::ApplicationData();
-    EXPECT_EQ(AcrobatPluginsFolder("Acrobat 2017", data)->NativePath(),
-              tree.Path() / "Users/user/Library/Application Support/Adobe/Acrobat/2017/Plug-ins");
-    EXPECT_TRUE(AcrobatPluginsFolder("-", data).IsNil());
 }
 
 }  // namespace

@@ -1,6 +1,9 @@
-// The real window driven by the keyboard: the list's keys and its focus, Tab to the segments,
-// Copy of a row.
+// The real window without a mouse. Driven by the keyboard: the list's keys and its focus, the
+// pages' focus, Tab to the segments, Copy of a row. Read by a screen reader, through Qt's
+// accessibility interfaces: the segments as page tabs, the panes named by their tabs, and each
+// report value with its caption.
 #include <QAbstractScrollArea>
+#include <QAccessible>
 #include <QClipboard>
 #include <QMenu>
 #include <QPushButton>
@@ -31,17 +34,64 @@ class KeyboardTest : public WindowTest {
     }
 };
 
-TEST_F(KeyboardTest, EndSelectsTheLastRowAndReturnOpensItsReport) {
-    Store({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin.ai")});
-    auto window = StartFocused();
+// End selects the last row; Copy puts the heading line and that row on the clipboard, and
+// Return opens its report. A page that comes into view takes the focus at its first control in
+// the keyboard order when the focus would go out of view with the page before; a text pane
+// rings itself while focused. Tab leaves the list for the segments, where Space chooses a page
+// and the focus stays.
+TEST_F(KeyboardTest, ThroughThePagesByKeys) {
+    auto window =
+        StartUp({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin\tlid.ai")});
+    QApplication::setActiveWindow(window->Native());
+    ASSERT_EQ(QApplication::focusWidget(), &View(window)) << "the list page, at start";
+    auto* copy = InMenuBar<QAction>(window, "EditCopy");
+    ASSERT_NE(copy, nullptr);
+    EXPECT_EQ(copy->shortcut(), QKeySequence(QKeySequence::Copy));
+    auto offered = [copy] {
+        emit static_cast<QMenu*>(copy->parent())->aboutToShow();
+        const bool enabled = copy->isEnabled();
+        emit static_cast<QMenu*>(copy->parent())->aboutToHide();
+        return enabled;
+    };
+    QApplication::clipboard()->setText("before");
+    EXPECT_FALSE(offered()) << "nothing selected";
+    Key(Qt::Key_C, Qt::ControlModifier);
+    EXPECT_EQ(QApplication::clipboard()->text(), "before");
     Key(Qt::Key_Return);
     EXPECT_EQ(window->PagePanel1()->Value(), 1) << "no row selected, nothing to open";
 
     Key(Qt::Key_End);
     ASSERT_EQ(window->Listbox1()->ListIndex(), 2);
+    EXPECT_TRUE(offered());
+    Key(Qt::Key_C, Qt::ControlModifier);
+    EXPECT_EQ(QApplication::clipboard()->text().toStdString(),
+              "Date - Time\tDocument\tRead Value\tGrade\n2018-11-03\tTin lid.ai\t 3\tA\n");
     Key(Qt::Key_Return);
     EXPECT_EQ(window->PagePanel1()->Value(), 2);
-    EXPECT_EQ(window->Label6(7)->Text(), "Tin.ai");
+    EXPECT_EQ(window->Label6(7)->Text(), "Tin\tlid.ai");
+
+    EXPECT_EQ(QApplication::focusWidget(), window->PushButton2()->Widget());
+    auto* pane = static_cast<QAbstractScrollArea*>(window->TextArea1()->Widget());
+    const QRgb ground = Pixel(pane->viewport(), 1, 1);
+    Key(Qt::Key_Tab);
+    Key(Qt::Key_Tab);
+    ASSERT_EQ(QApplication::focusWidget(), pane);
+    EXPECT_GE(Contrast(Pixel(pane->viewport(), 1, 1), ground), 4.5) << "the pane is ringed";
+    window->PushButton2()->Push();
+    ASSERT_EQ(QApplication::focusWidget(), &View(window));
+
+    Key(Qt::Key_Tab);
+    ASSERT_TRUE(window->MainTabs()->Widget()->isAncestorOf(QApplication::focusWidget()))
+        << "Tab reaches a segment";
+    EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation");
+    Key(Qt::Key_Space);
+    EXPECT_EQ(window->PagePanel1()->Value(), 0);
+    EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation")
+        << "the focus stays on the segments that chose the page";
+    window->MainTabs()->Press(1);
+    View(window).setFocus();
+    window->MainTabs()->Press(0);
+    EXPECT_EQ(QApplication::focusWidget(), window->PushButton1()->Widget());
 }
 
 // The list that gets the focus rings its first row without choosing it; the first Down chooses
@@ -65,67 +115,59 @@ TEST_F(KeyboardTest, TheFocusedListRingsItsCurrentRowWhichTheFirstDownChooses) {
         window->Close();
         ProcessEvents();
     }
-    SetAppearanceForTesting(Appearance::Light);
 }
 
-// A page that comes into view takes the focus at its first control in the keyboard order when
-// the focus would go out of view with the page before; a text pane rings itself while focused.
-TEST_F(KeyboardTest, TheShownPageTakesTheFocusAtItsFirstControl) {
-    Store({Result("1", "Box.ai")});
-    auto window = StartUp();
-    QApplication::setActiveWindow(window->Native());
-    EXPECT_EQ(QApplication::focusWidget(), &View(window)) << "the list page, at start";
+class AccessibilityTest : public WindowTest {
+  protected:
+    static QAccessibleInterface& Spoken(QWidget* widget) {
+        QAccessibleInterface* spoken = QAccessible::queryAccessibleInterface(widget);
+        EXPECT_NE(spoken, nullptr);
+        return *spoken;
+    }
+    static std::string Name(QWidget* widget) {
+        return Spoken(widget).text(QAccessible::Name).toStdString();
+    }
+};
 
-    DoubleClickRow(window, 0);
-    ASSERT_EQ(window->PagePanel1()->Value(), 2);
-    EXPECT_EQ(QApplication::focusWidget(), window->PushButton2()->Widget());
-    auto* pane = static_cast<QAbstractScrollArea*>(window->TextArea1()->Widget());
-    const QRgb ground = Pixel(pane->viewport(), 1, 1);
-    Key(Qt::Key_Tab);
-    Key(Qt::Key_Tab);
-    ASSERT_EQ(QApplication::focusWidget(), pane);
-    EXPECT_GE(Contrast(Pixel(pane->viewport(), 1, 1), ground), 4.5) << "the pane is ringed";
+// The segments are page tabs of which one is selected, and a screen reader presses a tab as a
+// user clicks it. The panes are named by their tabs, and each value of the report is labelled
+// by the caption at its height; the centred line has none.
+TEST_F(AccessibilityTest, TheSegmentsThePanesAndTheValuesAreSpoken) {
+    auto window = StartUp({Result("1", "Box.ai")});
+    QWidget* row = window->MainTabs()->Widget();
+    EXPECT_EQ(Spoken(row).role(), QAccessible::PageTabList);
+    const auto segments = row->findChildren<QPushButton*>(Qt::FindDirectChildrenOnly);
+    ASSERT_EQ(segments.size(), 2);
+    for (int i = 0; i < 2; ++i) {
+        QAccessibleInterface& tab = Spoken(segments[i]);
+        EXPECT_EQ(tab.role(), QAccessible::PageTab);
+        EXPECT_EQ(tab.parent()->role(), QAccessible::PageTabList);
+        EXPECT_TRUE(tab.state().selectable);
+        EXPECT_EQ(tab.state().selected, i == 1) << "the list page's tab";
+        EXPECT_FALSE(tab.state().checkable);
+    }
+    EXPECT_EQ(Name(segments[0]), "Installation");
+    EXPECT_EQ(Name(segments[1]), "Verification Results");
 
-    window->PushButton2()->Push();
-    EXPECT_EQ(QApplication::focusWidget(), &View(window));
-    window->MainTabs()->Press(0);
-    EXPECT_EQ(QApplication::focusWidget(), window->PushButton1()->Widget());
-}
+    ASSERT_TRUE(DoubleClickRow(window, 0));
+    EXPECT_EQ(Name(window->TextArea1()->Widget()), "Measurements");
+    EXPECT_TRUE(Spoken(window->TextArea1()->Widget()).state().readOnly) << "a text to read";
+    window->TabPanel1()->SetValue(1);
+    EXPECT_EQ(Name(window->TextArea2()->Widget()), "Deviances");
+    const std::vector<std::pair<long long, long long>> captionOfValue = {
+        {6, 7}, {0, 0}, {1, 1}, {2, 2}, {3, 3}, {4, 4}, {5, 5}, {7, 8}};
+    for (const auto& [caption, value] : captionOfValue) {
+        const auto labels = Spoken(window->Label6(value)->Widget()).relations(QAccessible::Label);
+        ASSERT_EQ(labels.size(), 1) << "Label6(" << value << ")";
+        EXPECT_EQ(labels.front().first->text(QAccessible::Name).toStdString(),
+                  window->Label5(caption)->Text());
+    }
+    EXPECT_TRUE(Spoken(window->Label6(6)->Widget()).relations(QAccessible::Label).isEmpty());
 
-TEST_F(KeyboardTest, TabLeavesTheListForTheSegmentsWhichSpaceChooses) {
-    Store({Result("1", "Box.ai")});
-    auto window = StartFocused();
-    Key(Qt::Key_Tab);
-    ASSERT_TRUE(window->MainTabs()->Widget()->isAncestorOf(QApplication::focusWidget()))
-        << "Tab reaches a segment";
-    EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation");
-    Key(Qt::Key_Space);
+    Spoken(segments[0]).actionInterface()->doAction(QAccessibleActionInterface::pressAction());
     EXPECT_EQ(window->PagePanel1()->Value(), 0);
-    EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation")
-        << "the focus stays on the segments that chose the page";
-}
-
-TEST_F(KeyboardTest, CopyPutsTheHeadingLineAndTheSelectedRowOnTheClipboard) {
-    Store({Result("1", "Box.ai"), Result("2", "Jar\tlid.ai")});
-    auto window = StartFocused();
-    auto* copy = InMenuBar<QAction>(window, "EditCopy");
-    ASSERT_NE(copy, nullptr);
-    auto offered = [copy] {
-        emit static_cast<QMenu*>(copy->parent())->aboutToShow();
-        const bool enabled = copy->isEnabled();
-        emit static_cast<QMenu*>(copy->parent())->aboutToHide();
-        return enabled;
-    };
-    QApplication::clipboard()->setText("before");
-    EXPECT_FALSE(offered()) << "nothing selected";
-    Key(Qt::Key_C, Qt::ControlModifier);
-    EXPECT_EQ(QApplication::clipboard()->text(), "before");
-
-    Key(Qt::Key_End);
-    EXPECT_TRUE(offered());
-    Key(Qt::Key_C, Qt::ControlModifier);
-    EXPECT_EQ(QApplication::clipboard()->text().toStdString(),
-              "Date - Time\tDocument\tRead Value\tGrade\n2018-11-02\tJar lid.ai\t 2\tA\n");
+    EXPECT_TRUE(Spoken(segments[0]).state().selected);
+    EXPECT_FALSE(Spoken(segments[1]).state().selected);
 }
 
 }  // namespace

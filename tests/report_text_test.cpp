@@ -20,46 +20,34 @@ const std::string kLayoutA =
 const std::string kLayoutB =
     "Code is EAN 13\rCode reads 1234567890128" + kLayoutA.substr(kLayoutA.find("\r\r"));
 
-struct ReaderCase {
-    friend void PrintTo(const ReaderCase& c, std::ostream* os) { *os << c.name; }
-    const char* name;
-    std::string text;
-    std::string listValue;
-    std::string reportValue;
-    std::string codeType;
-    bool report;
-};
-
-class ReadersTest : public ::testing::TestWithParam<ReaderCase> {};
-
-TEST_P(ReadersTest, ReadTheValuesOfLinesOneAndTwo) {
-    const ReaderCase& c = GetParam();
-    EXPECT_EQ(ListReadValue(c.text), c.listValue);
-    EXPECT_EQ(ReportReadValue(c.text), c.reportValue);
-    EXPECT_EQ(ReportCodeType(c.text), c.codeType);
-    EXPECT_EQ(PassesReportTest(c.text), c.report);
+// Each reader of lines one and two on both layouts and the sharp cases: the list's read value,
+// the report's read value and code type, and whether the report shows at all.
+TEST(ReportText, ReadersOfLinesOneAndTwo) {
+    const struct {
+        std::string text, listValue, reportValue, codeType;
+        bool report;
+    } cases[] = {
+        {kLayoutA, " 1234567890128", " 1234567890128", " EAN 13", true},
+        {kLayoutB, " 1234567890128", " 1234567890128", " EAN 13", true},
+        {"", "", "", "", false},
+        {"Verifier\rCode reads 42", " 42", " 42", "", false},  // on line two only
+        {"Code reads 42 and more", " 42 and more", " 42 and more", "", true},
+        {"Code reads 42 Code is EAN 8\rnothing", " 42 Code is EAN 8", " 42 Code is EAN 8", " EAN 8",
+         true},
+        {"Code is Sized at 80 %", "", "", " Sized at 80 %", true},
+        {"Code reads 12 Code reads 34", " 12 ", " 12 ", "", true},  // cut at the marker
+        {"Code reads\rCode reads 99", "", " 99", "", true},  // the list and the report differ
+        {"CODE READS 7\rcode is UPC A", " 7", " 7", " UPC A", true},
+        {"Code reads 5\r\nCode is EAN 8\r\n", " 5", " 5", " EAN 8", true},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.text);
+        EXPECT_EQ(ListReadValue(c.text), c.listValue);
+        EXPECT_EQ(ReportReadValue(c.text), c.reportValue);
+        EXPECT_EQ(ReportCodeType(c.text), c.codeType);
+        EXPECT_EQ(PassesReportTest(c.text), c.report);
+    }
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Texts, ReadersTest,
-    ::testing::Values(
-        ReaderCase{"LayoutA", kLayoutA, " 1234567890128", " 1234567890128", " EAN 13", true},
-        ReaderCase{"LayoutB", kLayoutB, " 1234567890128", " 1234567890128", " EAN 13", true},
-        ReaderCase{"Empty", "", "", "", "", false},
-        ReaderCase{"CodeReadsOnLineTwoOnly", "Verifier\rCode reads 42", " 42", " 42", "", false},
-        ReaderCase{"OneLineWithoutReturn", "Code reads 42 and more", " 42 and more", " 42 and more",
-                   "", true},
-        ReaderCase{"BothMarkersOnLineOne", "Code reads 42 Code is EAN 8\rnothing",
-                   " 42 Code is EAN 8", " 42 Code is EAN 8", " EAN 8", true},
-        ReaderCase{"SizedAtOnLineOnePassesTheTest", "Code is Sized at 80 %", "", "",
-                   " Sized at 80 %", true},
-        ReaderCase{"ReadValueHoldingTheMarkerIsCut", "Code reads 12 Code reads 34", " 12 ", " 12 ",
-                   "", true},
-        ReaderCase{"EmptyValueOnLineOneListVersusReport", "Code reads\rCode reads 99", "", " 99",
-                   "", true},
-        ReaderCase{"CaseIsIgnored", "CODE READS 7\rcode is UPC A", " 7", " 7", " UPC A", true},
-        ReaderCase{"CrLfEndings", "Code reads 5\r\nCode is EAN 8\r\n", " 5", " 5", " EAN 8", true}),
-    [](const auto& info) { return std::string(info.param.name); });
 
 TEST(ReportText, AMarkerOnTheWrongLineGivesNothing) {
     const std::string text = "Code reads 1\rCode is 2\r\rBar Deviance 6\rSymbol Length 3";
@@ -77,18 +65,17 @@ TEST(ReportText, CrLfCarriesTheLineFeedIntoLineEightAndTheBlocks) {
 }
 
 TEST(ReportText, MissingAndReversedBlockMarkers) {
-    const std::string noMeasurements = "Code reads 1\rBar/Space Deviances = +- mic 0\rBar 1 +4";
-    EXPECT_EQ(MeasurementsBlock(noMeasurements), "");
-    EXPECT_EQ(DeviancesBlock(noMeasurements), "\rBar 1 +4");
-
-    const std::string noDeviances = "Code reads 1\rActual Measurements = +- mic 0\rBar 1 330";
-    EXPECT_EQ(MeasurementsBlock(noDeviances), "\rBar 1 330");
-    EXPECT_EQ(DeviancesBlock(noDeviances), "");
-
-    const std::string reversed =
-        "x\rBar/Space Deviances = +- mic 0\rD\rActual Measurements = +- mic 0\rM";
-    EXPECT_EQ(MeasurementsBlock(reversed), "\rM");
-    EXPECT_EQ(DeviancesBlock(reversed), "\rD\rActual Measurements = +- mic 0\rM");
+    const std::string m = "Actual Measurements = +- mic 0", d = "Bar/Space Deviances = +- mic 0";
+    const std::string cases[][3] = {
+        // The text, its measurements block and its deviances block.
+        {"Code reads 1\r" + d + "\rBar 1 +4", "", "\rBar 1 +4"},
+        {"Code reads 1\r" + m + "\rBar 1 330", "\rBar 1 330", ""},
+        {"x\r" + d + "\rD\r" + m + "\rM", "\rM", "\rD\r" + m + "\rM"},
+    };
+    for (const auto& [text, measurements, deviances] : cases) {
+        EXPECT_EQ(MeasurementsBlock(text), measurements) << text;
+        EXPECT_EQ(DeviancesBlock(text), deviances) << text;
+    }
 }
 
 }  // namespace

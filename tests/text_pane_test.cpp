@@ -48,60 +48,38 @@ class TextPaneTest : public ::testing::Test {
     TextPane pane;
 };
 
-struct MouseCase {
-    const char* name;
-    std::string text;
-    int columns;
-    QPoint from, to;  // cells; with no move, a double click at `from`
-    int moves;
-    QString selected;
-};
-
-class MouseTest : public TextPaneTest, public ::testing::WithParamInterface<MouseCase> {};
-
-TEST_P(MouseTest, SelectsWhatThePointerCrosses) {
-    const MouseCase& c = GetParam();
-    const Grid grid = Show(c.text, c.columns);
-    if (c.moves == 0) {
-        QTest::mouseDClick(pane.viewport(), Qt::LeftButton, {}, grid.At(c.from));
-    } else {
-        Drag(grid.At(c.from), grid.At(c.to), c.moves);
-    }
-    EXPECT_EQ(pane.SelectedText(), c.selected);
-}
-
 const std::string kBars = "Bar 1 330\rBar 2 660\r\nBar 3 990\nBar 4";
 
-INSTANTIATE_TEST_SUITE_P(
-    Pointer, MouseTest,
-    ::testing::Values(
-        MouseCase{
-            "DragOverEachKindOfLineEnd", kBars, 20, {4, 0}, {5, 2}, 1, "1 330\nBar 2 660\nBar 3"},
-        MouseCase{"DoubleClickTakesAWord", kBars, 20, {7, 1}, {}, 0, "660"},
-        MouseCase{"ALongLineWrapsBehindABlank",
-                  "Bar 1 330 Bar 2 660",
-                  10,
-                  {0, 1},
-                  {9, 1},
-                  1,
-                  "Bar 2 660"},
-        MouseCase{"ALongWordBreaksAnywhere", "0123456789abcdef", 10, {0, 1}, {6, 1}, 1, "abcdef"},
-        MouseCase{"ColumnsCountCharactersNotBytes",
-                  "Größe 12µm",
-                  20,
-                  {2, 0},
-                  {9, 0},
-                  1,
-                  QString::fromUtf8("öße 12µ")},
-        // Each move below the pane scrolls it a row: three moves reach row 9 of the text.
-        MouseCase{"ADragBelowThePaneScrolls",
-                  "0\r1\r2\r3\r4\r5\r6\r7\r8\r9\r10",
-                  10,
-                  {0, 0},
-                  {0, 6},
-                  3,
-                  "0\n1\n2\n3\n4\n5\n6\n7\n8\n"}),
-    [](const auto& info) { return std::string(info.param.name); });
+// A drag from one cell to another, or with no move a double click, selects what the pointer
+// crosses: over each kind of line end, in rows wrapped behind a blank or in a long word, in
+// characters rather than bytes. Each move below the pane scrolls it a row: three moves reach
+// row 9 of the text.
+TEST_F(TextPaneTest, SelectsWhatThePointerCrosses) {
+    const struct {
+        std::string text;
+        int columns;
+        QPoint from, to;
+        int moves;
+        QString selected;
+    } cases[] = {
+        {kBars, 20, {4, 0}, {5, 2}, 1, "1 330\nBar 2 660\nBar 3"},
+        {kBars, 20, {7, 1}, {}, 0, "660"},
+        {"Bar 1 330 Bar 2 660", 10, {0, 1}, {9, 1}, 1, "Bar 2 660"},
+        {"0123456789abcdef", 10, {0, 1}, {6, 1}, 1, "abcdef"},
+        {"Größe 12µm", 20, {2, 0}, {9, 0}, 1, QString::fromUtf8("öße 12µ")},
+        {"0\r1\r2\r3\r4\r5\r6\r7\r8\r9\r10", 10, {0, 0}, {0, 6}, 3, "0\n1\n2\n3\n4\n5\n6\n7\n8\n"},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.text);
+        const Grid grid = Show(c.text, c.columns);
+        if (c.moves == 0) {
+            QTest::mouseDClick(pane.viewport(), Qt::LeftButton, {}, grid.At(c.from));
+        } else {
+            Drag(grid.At(c.from), grid.At(c.to), c.moves);
+        }
+        EXPECT_EQ(pane.SelectedText(), c.selected);
+    }
+}
 
 // The highlight lies under the selected characters of the wrapped row and nowhere else.
 TEST_F(TextPaneTest, PaintsTheHighlightUnderTheSelectionAlone) {

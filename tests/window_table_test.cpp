@@ -1,9 +1,13 @@
 // The window as built from its property blocks and control table: its frame, the controls'
-// starting states and their fonts.
+// starting states and their fonts; the menu bar in its native form: Quit, and the icons of its
+// style.
 #include <QFontInfo>
+#include <QMenu>
 #include <QPushButton>
+#include <QStyle>
 #include <QTest>
 
+#include "platform/runtime/application_style.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -24,8 +28,8 @@ TEST_F(WindowTableTest, TheWindowAndItsControlsStartAsAUserFindsThem) {
                           Qt::WindowFullscreenButtonHint));
 
     EXPECT_THROW(window->Label5(8)->Text(), NilObjectException) << "a set has its own indexes";
-    EXPECT_TRUE(static_cast<QPushButton*>(window->PushButton1()->Widget())->isDefault());
-    EXPECT_FALSE(static_cast<QPushButton*>(window->PushButton2()->Widget())->isDefault());
+    EXPECT_FALSE(static_cast<QPushButton*>(window->PushButton2()->Widget())->isDefault())
+        << "the installation page's button alone is pressed by Return";
     window->TextArea1()->SetText("Bar 1 330");
     QTest::keyClicks(window->TextArea1()->Widget(), "x\b");
     EXPECT_EQ(window->TextArea1()->Text(), "Bar 1 330") << "read-only";
@@ -35,11 +39,9 @@ TEST_F(WindowTableTest, TheWindowAndItsControlsStartAsAUserFindsThem) {
     const qsizetype panel = order.indexOf(window->TabPanel1()->Widget());
     EXPECT_GT(order.indexOf(window->TextArea1()->Widget()), panel);
     EXPECT_GT(order.indexOf(window->TextArea2()->Widget()), panel);
-}
 
-// A family missing here shows in the face that the desktop gives in its place.
-TEST_F(WindowTableTest, EachControlShowsInItsTableFont) {
-    auto window = StartUp();
+    // Each control shows in its table's font; a family missing here shows in the face that the
+    // desktop gives in its place.
     struct Expected {
         Ref<Control> control;
         QString family;  // empty: the desktop's font
@@ -70,6 +72,33 @@ TEST_F(WindowTableTest, EachControlShowsInItsTableFont) {
         EXPECT_EQ(font.pixelSize(), e.family.isEmpty() ? desktop.pixelSize() : e.pixelSize)
             << e.control->Name();
         EXPECT_EQ(font.bold(), e.bold) << e.control->Name();
+    }
+}
+
+// Quit, with the shortcut users reach for; Copy's is met in keyboard_test.
+TEST_F(WindowTableTest, QuitEndsTheEventLoopAndClosesTheWindow) {
+    auto window = StartUp();
+    QMenu* file = InMenuBar<QMenu>(window, "FileMenu");
+    ASSERT_NE(file, nullptr);
+    EXPECT_EQ(file->actions().at(0)->shortcut(), QKeySequence("Ctrl+Q"));
+    QTimer::singleShot(0, [file] { file->actions().at(0)->trigger(); });
+    QTimer::singleShot(5000, [] { QCoreApplication::exit(1); });
+    EXPECT_EQ(QCoreApplication::exec(), 0);
+    EXPECT_FALSE(window->IsOpen());
+    EXPECT_TRUE(_GetImplicitWindow("Window1.Window1").IsNil());
+}
+
+// The menu bar's overflow icon, handed over unread, draws as the desktop style's own; the
+// other icons come from that style unchanged.
+TEST(ApplicationStyleTest, IconsLookAsTheDesktopStylesOwn) {
+    ApplicationStyle style;
+    QStyle* desktop = QApplication::style();
+    for (auto which : {QStyle::SP_ToolBarHorizontalExtensionButton, QStyle::SP_MessageBoxWarning}) {
+        const QIcon icon = style.standardIcon(which);
+        ASSERT_FALSE(icon.isNull()) << which;
+        EXPECT_EQ(icon.pixmap(QSize(16, 16)).toImage(),
+                  desktop->standardIcon(which).pixmap(QSize(16, 16)).toImage())
+            << which;
     }
 }
 
