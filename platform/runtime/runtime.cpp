@@ -26,7 +26,6 @@
 
 namespace {
 ExceptionHelper exceptionHelper = nullptr;
-double releaseStamp = 0.0;
 std::function<void()> pendingLateStartup;
 int exitStatus = 0;
 std::unique_ptr<QApplication> ownApplication;
@@ -186,13 +185,8 @@ void _RuntimeSetExceptionHelper(ExceptionHelper helper) {
     exceptionHelper = helper;
 }
 
-void _RuntimeSetReleaseStamp(double stamp) {
-    releaseStamp = stamp;
-}
-
-double RuntimeReleaseStamp() {
-    return releaseStamp;
-}
+// Nothing asks which release of the run-time the program expects.
+void _RuntimeSetReleaseStamp(double) {}
 
 // Qt 6 always draws for high-density screens.
 void _SetSupportsHiDPI(bool) {}

@@ -126,17 +126,10 @@ long long PopupMenu::ListIndex() const {
 }
 
 void PopupMenu::SetListIndex(long long index) {
-    if (index < -1 || index >= ListCount()) {
+    if (index < -1 || index >= static_cast<long long>(rows_.size())) {
         throw OutOfBoundsException("Popup row out of bounds");
     }
     static_cast<QComboBox&>(LiveWidget()).setCurrentIndex(static_cast<int>(index));
-}
-
-std::string PopupMenu::List(long long index) const {
-    if (index < 0 || index >= ListCount()) {
-        throw OutOfBoundsException("Popup row out of bounds");
-    }
-    return rows_[static_cast<size_t>(index)];
 }
 
 void PopupMenu::RaiseOpen() {

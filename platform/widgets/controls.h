@@ -46,8 +46,6 @@ class PopupMenu : public Control {
     std::string Text() const;
     long long ListIndex() const;
     void SetListIndex(long long index);
-    long long ListCount() const { return static_cast<long long>(rows_.size()); }
-    std::string List(long long index) const;
     void RaiseOpen() override;
 
     std::function<void(PopupMenu&)> Open;

@@ -64,13 +64,11 @@ void ListView::SetDesignedWidths(std::vector<int> widths) {
     FitColumns();
 }
 
-QString ListView::SelectionText() const {
-    if (!model() || !HasSelectedRow()) {
-        return {};
-    }
-    const QModelIndexList rows = selectionModel()->selectedRows();
-    if (rows.isEmpty()) {
-        return {};
+void ListView::CopySelection() const {
+    const QModelIndexList rows =
+        HasSelectedRow() ? selectionModel()->selectedRows() : QModelIndexList();
+    if (!model() || rows.isEmpty()) {
+        return;
     }
     QStringList headings;
     QStringList cells;
@@ -78,13 +76,7 @@ QString ListView::SelectionText() const {
         headings << OneLine(model()->headerData(column, Qt::Horizontal).toString());
         cells << OneLine(model()->index(rows.first().row(), column).data().toString());
     }
-    return headings.join('\t') + '\n' + cells.join('\t') + '\n';
-}
-
-void ListView::CopySelection() const {
-    if (const QString text = SelectionText(); !text.isEmpty()) {
-        QApplication::clipboard()->setText(text);
-    }
+    QApplication::clipboard()->setText(headings.join('\t') + '\n' + cells.join('\t') + '\n');
 }
 
 void ListView::keyPressEvent(QKeyEvent* event) {
