@@ -233,22 +233,6 @@ const PropertyValue* PropertyObject::Property(const std::string& name) const {
     return found == properties_.end() ? nullptr : &found->second;
 }
 
-bool PropertyObject::BoolProperty(const std::string& name) const {
-    const auto* value = Property(name);
-    return value && std::holds_alternative<bool>(*value) && std::get<bool>(*value);
-}
-
-long long PropertyObject::IntegerProperty(const std::string& name) const {
-    const auto* value = Property(name);
-    return value && std::holds_alternative<long long>(*value) ? std::get<long long>(*value) : 0;
-}
-
-std::string PropertyObject::StringProperty(const std::string& name) const {
-    const auto* value = Property(name);
-    return value && std::holds_alternative<std::string>(*value) ? std::get<std::string>(*value)
-                                                                : std::string();
-}
-
 void _SetProperties(PropertyObject& object, std::string_view block) {
     for (const auto& [name, value] : DecodePropertyBlock(block)) {
         object.SetProperty(name, value);

@@ -47,10 +47,12 @@ class PropertyObject {
     virtual void PropertiesApplied() {}
 
     const PropertyValue* Property(const std::string& name) const;
-    const std::map<std::string, PropertyValue>& Properties() const { return properties_; }
-    bool BoolProperty(const std::string& name) const;
-    long long IntegerProperty(const std::string& name) const;
-    std::string StringProperty(const std::string& name) const;
+    // The value given under that name if it has the type T, else `absent`.
+    template <class T>
+    T PropertyOr(const std::string& name, T absent = T()) const {
+        const PropertyValue* value = Property(name);
+        return value && std::holds_alternative<T>(*value) ? std::get<T>(*value) : absent;
+    }
 
   private:
     std::map<std::string, PropertyValue> properties_;

@@ -79,7 +79,6 @@ class TextArea : public Control {
     void SetText(std::string text);
 
   private:
-    void Apply(const std::string& name, const PropertyValue& value);
     // Held once, by the control and its pane together.
     std::shared_ptr<const std::string> text_ = std::make_shared<const std::string>();
 };

@@ -98,7 +98,7 @@ void Window::Constructor() {
         RaiseEvent([&control] { control->RaiseOpen(); });
     }
     RaiseEvent([this] { Event_Open(); });
-    if (BoolProperty("Visible")) {
+    if (PropertyOr<bool>("Visible")) {
         native_->show();
     }
 }
@@ -111,8 +111,8 @@ void Window::SetProperty(const std::string& name, const PropertyValue& value) {
     if (name == "Title") {
         native_->setWindowTitle(QString::fromStdString(std::get<std::string>(value)));
     } else if (name == "Width" || name == "Height") {
-        client_->setFixedSize(static_cast<int>(IntegerProperty("Width")),
-                              static_cast<int>(IntegerProperty("Height")));
+        client_->setFixedSize(static_cast<int>(PropertyOr<long long>("Width")),
+                              static_cast<int>(PropertyOr<long long>("Height")));
     } else if (name == "BackColor") {
         SetBackColor(std::get<ColorWord>(value).value);
     } else if (name == "MenuBarVisible" && native_->menuWidget()) {
@@ -121,7 +121,7 @@ void Window::SetProperty(const std::string& name, const PropertyValue& value) {
 }
 
 std::string Window::Title() const {
-    return StringProperty("Title");
+    return PropertyOr<std::string>("Title");
 }
 
 void Window::SetBackColor(Color color) {
