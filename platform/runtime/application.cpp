@@ -83,9 +83,3 @@ void RaiseEvent(const std::function<void()>& handler) {
 long long HandlersEntered() {
     return handlersEntered;
 }
-
-bool RaiseBooleanEvent(const std::function<bool()>& handler) {
-    bool result = false;
-    RaiseEvent([&] { result = handler(); });
-    return result;
-}

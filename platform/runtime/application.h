@@ -53,7 +53,5 @@ void _RuntimeRegisterAppObject(Ref<Application> app);
 // Every handler that the platform calls goes through here: through the application's
 // exception rule, and never lets an exception into the event loop.
 void RaiseEvent(const std::function<void()>& handler);
-// The same for an event with a Boolean result; an exception counts as False.
-bool RaiseBooleanEvent(const std::function<bool()>& handler);
-// How many handlers have been entered through the two calls above, for tests that count them.
+// How many handlers have been entered through the call above, for tests that count them.
 long long HandlersEntered();

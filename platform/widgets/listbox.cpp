@@ -54,9 +54,11 @@ class CellDelegate : public QStyledItemDelegate {
         painter.setClipRect(0, 0, option.rect.width(), option.rect.height());
         auto g = New<Graphics>(painter, option.rect.width(), option.rect.height(),
                                FromQColor(option.palette.color(QPalette::Base)));
-        Listbox& list = *owner_;
-        const bool handled = RaiseBooleanEvent(
-            [&] { return list.CellBackgroundPaint(list, g, index.row(), index.column()); });
+        // An exception in the handler counts as False.
+        bool handled = false;
+        RaiseEvent([&, list = owner_] {
+            handled = list->CellBackgroundPaint(*list, g, index.row(), index.column());
+        });
         painter.restore();
         return handled;
     }
