@@ -38,8 +38,6 @@ class ListView : public QTableView {
 
   private:
     void FitColumns();
-    int SearchColumn() const;
-    bool ShowCutCellText(const QPoint& position, const QPoint& globalPosition);
 
     std::vector<int> designedWidths_;
     QString search_;

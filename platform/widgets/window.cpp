@@ -120,10 +120,6 @@ void Window::SetProperty(const std::string& name, const PropertyValue& value) {
     }
 }
 
-std::string Window::Title() const {
-    return PropertyOr<std::string>("Title");
-}
-
 void Window::SetBackColor(Color color) {
     RequireMainThread();
     backColor_ = color;
@@ -176,10 +172,6 @@ void Window::Close() {
     if (native_) {
         native_->close();
     }
-}
-
-QWidget* Window::Client() const {
-    return client_;
 }
 
 QWidget* Window::Native() const {
