@@ -19,7 +19,8 @@ struct ColorWord {
 // Boolean, integer, colour, TextSize, LineHeight/LineSpacing, string.
 using PropertyValue = std::variant<bool, long long, ColorWord, float, double, std::string>;
 
-// The type that a property name has in a block; Nothing for a name that no class knows.
+// The type that a property name has in a block; Nothing for a name that no class knows. The
+// others stand in the order of PropertyValue's alternatives.
 enum class PropertyType { Nothing, Boolean, Integer, Colour, Single, Double, String };
 PropertyType TypeOfProperty(std::string_view name);
 // Gives a name of a control's own its type, so that blocks can carry it.
