@@ -160,7 +160,6 @@ void RuntimeInit(int argc, char** argv) {
     }
     static char fallbackName[] = "orbelane";
     argvKept[0] = argc > 0 && argv[0] ? argv[0] : fallbackName;
-    argcKept = 1;
     ownApplication = std::make_unique<QApplication>(argcKept, argvKept);
     QApplication::setStyle(new ApplicationStyle);
     UseUnhintedText();

@@ -33,7 +33,6 @@ class SegmentedControl : public Control {
         explicit ItemList(SegmentedControl& owner) : owner_(owner) {}
         void Append(const Ref<SegmentedControlItem>& item);
         Ref<SegmentedControlItem> operator[](long long index) const;
-        long long Count() const;
 
       private:
         SegmentedControl& owner_;
