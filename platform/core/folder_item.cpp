@@ -106,19 +106,17 @@ std::string FolderItem::ShellPath() const {
 const std::vector<std::string>& FolderItem::Children() const {
     std::error_code error;
     const auto stamp = fs::last_write_time(path_, error);
-    if (error) {
-        children_.clear();
-        childrenRead_ = false;
-        return children_;
-    }
     // Folder times tick coarsely: a listing made within a tick of the last change may have
     // missed a later change in the same tick, so it is trusted only once the time is older.
     constexpr auto kTick = std::chrono::milliseconds(20);
-    if (childrenRead_ && stamp == childrenStamp_ && listedAt_ - stamp > kTick) {
+    if (!error && childrenRead_ && stamp == childrenStamp_ && listedAt_ - stamp > kTick) {
         return children_;
     }
     children_.clear();
     childrenRead_ = false;
+    if (error) {
+        return children_;  // nothing stands there
+    }
     fs::directory_iterator it(path_, error);
     if (error == std::errc::not_a_directory) {
         return children_;  // a file has no children

@@ -28,11 +28,6 @@ bool RefusedByDestination(const std::error_code& error) {
            error == std::errc::no_such_file_or_directory || error == std::errc::not_a_directory;
 }
 
-bool SomethingAt(const fs::path& path) {
-    std::error_code error;
-    return fs::exists(fs::symlink_status(path, error));
-}
-
 [[noreturn]] void Raise(const std::string& what, const fs::path& path) {
     throw IOException(what + ": " + path.string());
 }
@@ -85,7 +80,7 @@ void FolderItem::CopyFileTo(const Ref<FolderItem>& destination) const {
     } else {
         CopyOneFile(path_, target, error);
     }
-    if (error && (SomethingAt(target) || !RefusedByDestination(error))) {
+    if (error && (FolderItem(target).Exists() || !RefusedByDestination(error))) {
         Raise("Copy failed (" + error.message() + ")", target);
     }
 }
@@ -93,7 +88,7 @@ void FolderItem::CopyFileTo(const Ref<FolderItem>& destination) const {
 void FolderItem::CreateAsFolder() const {
     std::error_code error;
     fs::create_directory(path_, error);
-    if (error && (SomethingAt(path_) || !RefusedByDestination(error))) {
+    if (error && (Exists() || !RefusedByDestination(error))) {
         Raise("Can't create a folder (" + error.message() + ")", path_);
     }
 }

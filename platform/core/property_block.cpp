@@ -3,18 +3,13 @@
 #include "platform/core/property_block.h"
 
 #include <cstring>
-#include <unordered_map>
 
 #include "platform/core/exceptions.h"
 
 namespace {
 
 // Looked up by a view of the name, without building a string for it.
-struct NameHash {
-    using is_transparent = void;
-    size_t operator()(std::string_view name) const { return std::hash<std::string_view>{}(name); }
-};
-using TypeMap = std::unordered_map<std::string, PropertyType, NameHash, std::equal_to<>>;
+using TypeMap = std::map<std::string, PropertyType, std::less<>>;
 
 TypeMap& PropertyTypes() {
     using T = PropertyType;
@@ -118,10 +113,7 @@ TypeMap& PropertyTypes() {
 }
 
 PropertyType TypeOfValue(const PropertyValue& value) {
-    constexpr PropertyType kByIndex[] = {PropertyType::Boolean, PropertyType::Integer,
-                                         PropertyType::Colour,  PropertyType::Single,
-                                         PropertyType::Double,  PropertyType::String};
-    return kByIndex[value.index()];
+    return static_cast<PropertyType>(value.index() + 1);
 }
 
 template <class T>
@@ -165,8 +157,6 @@ PropertyBlock& PropertyBlock::Add(std::string_view name, PropertyValue value) {
             using V = std::decay_t<decltype(v)>;
             if constexpr (std::is_same_v<V, bool>) {
                 bytes_ += static_cast<char>(v ? 1 : 0);
-            } else if constexpr (std::is_same_v<V, long long>) {
-                AppendRaw<long long>(bytes_, v);
             } else if constexpr (std::is_same_v<V, ColorWord>) {
                 AppendRaw<std::uint32_t>(bytes_, v.value);
             } else if constexpr (std::is_same_v<V, std::string>) {
@@ -231,22 +221,6 @@ void PropertyObject::SetProperty(const std::string& name, const PropertyValue& v
 const PropertyValue* PropertyObject::Property(const std::string& name) const {
     const auto found = properties_.find(name);
     return found == properties_.end() ? nullptr : &found->second;
-}
-
-bool PropertyObject::BoolProperty(const std::string& name) const {
-    const auto* value = Property(name);
-    return value && std::holds_alternative<bool>(*value) && std::get<bool>(*value);
-}
-
-long long PropertyObject::IntegerProperty(const std::string& name) const {
-    const auto* value = Property(name);
-    return value && std::holds_alternative<long long>(*value) ? std::get<long long>(*value) : 0;
-}
-
-std::string PropertyObject::StringProperty(const std::string& name) const {
-    const auto* value = Property(name);
-    return value && std::holds_alternative<std::string>(*value) ? std::get<std::string>(*value)
-                                                                : std::string();
 }
 
 void _SetProperties(PropertyObject& object, std::string_view block) {

@@ -19,7 +19,8 @@ struct ColorWord {
 // Boolean, integer, colour, TextSize, LineHeight/LineSpacing, string.
 using PropertyValue = std::variant<bool, long long, ColorWord, float, double, std::string>;
 
-// The type that a property name has in a block; Nothing for a name that no class knows.
+// The type that a property name has in a block; Nothing for a name that no class knows. The
+// others stand in the order of PropertyValue's alternatives.
 enum class PropertyType { Nothing, Boolean, Integer, Colour, Single, Double, String };
 PropertyType TypeOfProperty(std::string_view name);
 // Gives a name of a control's own its type, so that blocks can carry it.
@@ -47,10 +48,12 @@ class PropertyObject {
     virtual void PropertiesApplied() {}
 
     const PropertyValue* Property(const std::string& name) const;
-    const std::map<std::string, PropertyValue>& Properties() const { return properties_; }
-    bool BoolProperty(const std::string& name) const;
-    long long IntegerProperty(const std::string& name) const;
-    std::string StringProperty(const std::string& name) const;
+    // The value given under that name if it has the type T, else `absent`.
+    template <class T>
+    T PropertyOr(const std::string& name, T absent = T()) const {
+        const PropertyValue* value = Property(name);
+        return value && std::holds_alternative<T>(*value) ? std::get<T>(*value) : absent;
+    }
 
   private:
     std::map<std::string, PropertyValue> properties_;

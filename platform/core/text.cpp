@@ -3,10 +3,10 @@
 #include "platform/core/text.h"
 
 #include <QChar>
+#include <QString>
 
 #include <locale.h>
 #include <algorithm>
-#include <charconv>
 #include <cmath>
 #include <cstdint>
 #include <cstdlib>
@@ -68,13 +68,6 @@ char32_t Fold(char32_t code) {
     return code < 0x110000 ? QChar::toCaseFolded(code) : code;
 }
 
-Match FindAscii(std::string_view source, size_t from, std::string_view find) {
-    std::string lower(find);
-    std::transform(lower.begin(), lower.end(), lower.begin(), FoldAscii);
-    const size_t at = FindLowerAscii(source, lower, from);
-    return at == std::string_view::npos ? Match{} : Match{at, find.size()};
-}
-
 Match FindFolded(std::string_view source, size_t from, std::string_view find) {
     std::vector<char32_t> needle;
     for (size_t at = 0, length = 0; at < find.size(); at += length) {
@@ -104,13 +97,13 @@ Match Find(std::string_view source, size_t from, std::string_view find) {
     if (find.empty() || from > source.size()) {
         return {};
     }
-    if (IsAscii(find)) {
-        if (find.size() > source.size() - from) {
-            return {};
-        }
-        return FindAscii(source, from, find);
+    if (!IsAscii(find)) {
+        return FindFolded(source, from, find);
     }
-    return FindFolded(source, from, find);
+    std::string lower(find);
+    std::transform(lower.begin(), lower.end(), lower.begin(), FoldAscii);
+    const size_t at = FindLowerAscii(source, lower, from);
+    return at == std::string_view::npos ? Match{} : Match{at, find.size()};
 }
 
 size_t CharacterCount(std::string_view text) {
@@ -235,19 +228,10 @@ double Val(std::string_view source) {
             at = beforeExponent;
         }
     }
-    std::string_view number = source.substr(begin, at - begin);
-    if (!number.empty() && number[0] == '+') {
-        number.remove_prefix(1);
-    }
-    double value = 0.0;
-    if (std::from_chars(number.data(), number.data() + number.size(), value).ec ==
-        std::errc::result_out_of_range) {
-        // from_chars gives nothing beyond the range of a double; strtod in the C locale gives
-        // what a double holds there: infinity, or the nearest representable value.
-        static const locale_t cLocale = newlocale(LC_ALL_MASK, "C", nullptr);
-        value = strtod_l(std::string(number).c_str(), nullptr, cLocale);
-    }
-    return value;
+    // In the C locale, whatever the desktop's; beyond the range of a double, strtod gives what a
+    // double holds there: infinity, or the nearest representable value.
+    static const locale_t cLocale = newlocale(LC_ALL_MASK, "C", nullptr);
+    return strtod_l(std::string(source.substr(begin, at - begin)).c_str(), nullptr, cLocale);
 }
 
 std::string Str(long long value, std::string_view /*format*/) {
@@ -255,27 +239,11 @@ std::string Str(long long value, std::string_view /*format*/) {
 }
 
 std::string Chr(long long code) {
-    std::string out;
-    const auto c = static_cast<char32_t>(code);
     if (code < 0 || code > 0x10FFFF) {
-        return out;
+        return {};
     }
-    if (c < 0x80) {
-        out += static_cast<char>(c);
-    } else if (c < 0x800) {
-        out += static_cast<char>(0xC0 | (c >> 6));
-        out += static_cast<char>(0x80 | (c & 0x3F));
-    } else if (c < 0x10000) {
-        out += static_cast<char>(0xE0 | (c >> 12));
-        out += static_cast<char>(0x80 | ((c >> 6) & 0x3F));
-        out += static_cast<char>(0x80 | (c & 0x3F));
-    } else {
-        out += static_cast<char>(0xF0 | (c >> 18));
-        out += static_cast<char>(0x80 | ((c >> 12) & 0x3F));
-        out += static_cast<char>(0x80 | ((c >> 6) & 0x3F));
-        out += static_cast<char>(0x80 | (c & 0x3F));
-    }
-    return out;
+    const auto c = static_cast<char32_t>(code);
+    return QString::fromUcs4(&c, 1).toStdString();
 }
 
 int RuntimeStringCompare(std::string_view first, std::string_view second) {

@@ -8,17 +8,6 @@
 namespace {
 Ref<Application> theApplication;
 long long handlersEntered = 0;
-
-// The dispatch rule without an application object: as if it had no UnhandledException handler.
-void CallWithoutApplication(const std::function<void()>& function) {
-    try {
-        function();
-    } catch (const EndException&) {
-    } catch (const ThreadEndException&) {
-    } catch (const RuntimeException& e) {
-        _UnhandledException(e);
-    }
-}
 }  // namespace
 
 Application::Application() {
@@ -49,20 +38,6 @@ void Application::_MacOSNotificationReceived(const std::string& name) {
     }
 }
 
-void Application::_x_SetVersionData(long long major, long long minor, long long bug,
-                                    long long nonRelease, long long stageCode,
-                                    std::string longVersion, std::string shortVersion,
-                                    std::string packageInfo) {
-    MajorVersion = major;
-    MinorVersion = minor;
-    BugVersion = bug;
-    NonReleaseVersion = nonRelease;
-    StageCode = stageCode;
-    LongVersion = std::move(longVersion);
-    ShortVersion = std::move(shortVersion);
-    PackageInfo = std::move(packageInfo);
-}
-
 Ref<Application> CurrentApplication() {
     return theApplication;
 }
@@ -74,13 +49,16 @@ void _RuntimeRegisterAppObject(Ref<Application> app) {
 void RaiseEvent(const std::function<void()>& handler) {
     ++handlersEntered;
     // A C++ exception must not cross Qt's event loop; one that is no RuntimeException,
-    // which the run-time would raise again, ends here at the last resort instead.
+    // which the run-time would raise again, ends here at the last resort instead. Without an
+    // application object the rule is that of one without an UnhandledException handler.
     try {
         if (theApplication) {
             theApplication->_CallFunctionWithExceptionHandling(handler);
         } else {
-            CallWithoutApplication(handler);
+            handler();
         }
+    } catch (const EndException&) {
+    } catch (const ThreadEndException&) {
     } catch (const RuntimeException& e) {
         _UnhandledException(e);
     } catch (const std::exception& e) {
@@ -90,10 +68,4 @@ void RaiseEvent(const std::function<void()>& handler) {
 
 long long HandlersEntered() {
     return handlersEntered;
-}
-
-bool RaiseBooleanEvent(const std::function<bool()>& handler) {
-    bool result = false;
-    RaiseEvent([&] { result = handler(); });
-    return result;
 }

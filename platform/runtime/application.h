@@ -30,18 +30,10 @@ class Application : public _MacOSDistributedNotifications::iNotify {
     // Raises AppearanceChanged for either of the two appearance notification names.
     void _MacOSNotificationReceived(const std::string& name) override;
 
-    void _x_SetVersionData(long long major, long long minor, long long bug, long long nonRelease,
-                           long long stageCode, std::string longVersion, std::string shortVersion,
-                           std::string packageInfo);
-
-    long long MajorVersion = 0;
-    long long MinorVersion = 0;
-    long long BugVersion = 0;
-    long long NonReleaseVersion = 0;
-    long long StageCode = 0;
-    std::string LongVersion;
-    std::string ShortVersion;
-    std::string PackageInfo;
+    // The version record: major, minor, bug and non-release version, stage code, long and short
+    // version, package information. Nothing reads it back, so it is not kept.
+    void _x_SetVersionData(long long, long long, long long, long long, long long, std::string,
+                           std::string, std::string) {}
 
     Ref<::MenuBar> MenuBar;
 };
@@ -53,7 +45,5 @@ void _RuntimeRegisterAppObject(Ref<Application> app);
 // Every handler that the platform calls goes through here: through the application's
 // exception rule, and never lets an exception into the event loop.
 void RaiseEvent(const std::function<void()>& handler);
-// The same for an event with a Boolean result; an exception counts as False.
-bool RaiseBooleanEvent(const std::function<bool()>& handler);
-// How many handlers have been entered through the two calls above, for tests that count them.
+// How many handlers have been entered through the call above, for tests that count them.
 long long HandlersEntered();

@@ -32,10 +32,6 @@ QString SessionBusAddress() {
     return {};
 }
 
-QDBusConnection Bus() {
-    return QDBusConnection(kConnectionName);
-}
-
 // The value comes wrapped in one variant or, from Read, in two.
 std::optional<Appearance> SchemeOf(QVariant value) {
     while (value.canConvert<QDBusVariant>() && value.userType() == qMetaTypeId<QDBusVariant>()) {
@@ -57,8 +53,8 @@ std::optional<Appearance> SchemeOf(QVariant value) {
 
 }  // namespace
 
-DesktopPortal::DesktopPortal(std::function<void(Appearance)> changed, QObject* parent)
-    : QObject(parent), changed_(std::move(changed)) {
+DesktopPortal::DesktopPortal(std::function<void(Appearance)> changed)
+    : changed_(std::move(changed)) {
     const QString address = SessionBusAddress();
     if (address.isEmpty()) {
         return;
@@ -79,7 +75,8 @@ std::optional<Appearance> DesktopPortal::Scheme() const {
     }
     QDBusMessage read = QDBusMessage::createMethodCall(kService, kPath, kInterface, "Read");
     read << QString(kGroup) << QString(kKey);
-    const QDBusMessage reply = Bus().call(read, QDBus::Block, kReadTimeoutMs);
+    const QDBusMessage reply =
+        QDBusConnection(kConnectionName).call(read, QDBus::Block, kReadTimeoutMs);
     if (reply.type() != QDBusMessage::ReplyMessage || reply.arguments().isEmpty()) {
         return std::nullopt;
     }

@@ -23,7 +23,7 @@ class DesktopPortal : public QObject {
 
   public:
     // Connects to the session bus, if there is one, and listens for changes of the scheme.
-    explicit DesktopPortal(std::function<void(Appearance)> changed, QObject* parent = nullptr);
+    explicit DesktopPortal(std::function<void(Appearance)> changed);
 
     // The scheme that the desktop asks for now; nothing without a bus or a portal, or when
     // the desktop states no preference.

@@ -26,7 +26,6 @@
 
 namespace {
 ExceptionHelper exceptionHelper = nullptr;
-double releaseStamp = 0.0;
 std::function<void()> pendingLateStartup;
 int exitStatus = 0;
 std::unique_ptr<QApplication> ownApplication;
@@ -161,7 +160,6 @@ void RuntimeInit(int argc, char** argv) {
     }
     static char fallbackName[] = "orbelane";
     argvKept[0] = argc > 0 && argv[0] ? argv[0] : fallbackName;
-    argcKept = 1;
     ownApplication = std::make_unique<QApplication>(argcKept, argvKept);
     QApplication::setStyle(new ApplicationStyle);
     UseUnhintedText();
@@ -186,13 +184,8 @@ void _RuntimeSetExceptionHelper(ExceptionHelper helper) {
     exceptionHelper = helper;
 }
 
-void _RuntimeSetReleaseStamp(double stamp) {
-    releaseStamp = stamp;
-}
-
-double RuntimeReleaseStamp() {
-    return releaseStamp;
-}
+// Nothing asks which release of the run-time the program expects.
+void _RuntimeSetReleaseStamp(double) {}
 
 // Qt 6 always draws for high-density screens.
 void _SetSupportsHiDPI(bool) {}

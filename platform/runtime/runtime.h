@@ -23,7 +23,6 @@ void UseInstalledIcon(const std::filesystem::path& executable);
 void RuntimePerformInitializers();
 void _RuntimeSetExceptionHelper(ExceptionHelper helper);
 void _RuntimeSetReleaseStamp(double stamp);
-double RuntimeReleaseStamp();
 void _SetSupportsHiDPI(bool flag);
 void _RuntimeInitExternalClasses();
 void _InitPluginEntrypoints();

@@ -32,7 +32,7 @@ class CanvasWidget : public QWidget {
         for (const QRect& r : event->region()) {
             areas.push_back({r.left(), r.top(), r.width(), r.height()});
         }
-        owner_->RaisePaint(g, areas);
+        RaiseEvent([&, owner = owner_] { owner->Event_Paint(g, areas); });
     }
 
   private:
@@ -65,7 +65,3 @@ void Canvas::DetachWidget() {
 }
 
 void Canvas::Event_Paint(Ref<Graphics>, const std::vector<Rect>&) {}
-
-void Canvas::RaisePaint(Ref<Graphics> g, const std::vector<Rect>& areas) {
-    RaiseEvent([&] { Event_Paint(g, areas); });
-}

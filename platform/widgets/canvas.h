@@ -16,6 +16,4 @@ class Canvas : public Control {
     void DetachWidget() override;
     // The Paint event: `g` covers the whole control, `areas` are the parts to redraw.
     virtual void Event_Paint(Ref<Graphics> g, const std::vector<Rect>& areas);
-    // Platform use: raised from the widget's paint.
-    void RaisePaint(Ref<Graphics> g, const std::vector<Rect>& areas);
 };

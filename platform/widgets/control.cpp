@@ -1,6 +1,7 @@
 // Control: placement at window coordinates, page visibility, fonts and the common properties.
 #include "platform/widgets/control.h"
 
+#include <QAbstractScrollArea>
 #include <QApplication>
 #include <QFont>
 #include <QWidget>
@@ -52,6 +53,11 @@ void Control::ApplyCommon(const std::string& name, const PropertyValue& value) {
         widget_->setToolTip(QString::fromStdString(std::get<std::string>(value)));
     } else if (name == "TextColor" || name == "BackColor") {
         ShowStoredColors(*widget_, *this);
+    } else if (auto* area = qobject_cast<QAbstractScrollArea*>(widget_); area && name == "Border") {
+        area->setFrameShape(std::get<bool>(value) ? QFrame::StyledPanel : QFrame::NoFrame);
+    } else if (area && (name == "ScrollBarVertical" || name == "ScrollbarVertical")) {
+        area->setVerticalScrollBarPolicy(std::get<bool>(value) ? Qt::ScrollBarAsNeeded
+                                                               : Qt::ScrollBarAlwaysOff);
     }
 }
 
@@ -125,13 +131,13 @@ QWidget& Control::LiveWidget() const {
 // Sizes are pixels, as on the desktop that the window was designed for; 0 is the default.
 void Control::SetWidgetFont() {
     QFont font = QApplication::font();
-    SetFontFamily(font, StringProperty("TextFont"));
-    if (const auto* size = Property("TextSize"); size && std::get<float>(*size) > 0) {
-        font.setPixelSize(static_cast<int>(std::lround(std::get<float>(*size))));
+    SetFontFamily(font, PropertyOr<std::string>("TextFont"));
+    if (const float size = PropertyOr<float>("TextSize"); size > 0) {
+        font.setPixelSize(static_cast<int>(std::lround(size)));
     }
-    font.setBold(BoolProperty("Bold"));
-    font.setItalic(BoolProperty("Italic"));
-    font.setUnderline(BoolProperty("Underline"));
+    font.setBold(PropertyOr<bool>("Bold"));
+    font.setItalic(PropertyOr<bool>("Italic"));
+    font.setUnderline(PropertyOr<bool>("Underline"));
     widget_->setFont(font);
 }
 

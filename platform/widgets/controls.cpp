@@ -79,7 +79,7 @@ void PushButton::Push() {
 }
 
 bool PushButton::PressAsDefault() {
-    if (!BoolProperty("Default") || !IsShown() || !LiveWidget().isEnabled()) {
+    if (!PropertyOr<bool>("Default") || !IsShown() || !LiveWidget().isEnabled()) {
         return false;
     }
     Push();
@@ -126,17 +126,10 @@ long long PopupMenu::ListIndex() const {
 }
 
 void PopupMenu::SetListIndex(long long index) {
-    if (index < -1 || index >= ListCount()) {
+    if (index < -1 || index >= static_cast<long long>(rows_.size())) {
         throw OutOfBoundsException("Popup row out of bounds");
     }
     static_cast<QComboBox&>(LiveWidget()).setCurrentIndex(static_cast<int>(index));
-}
-
-std::string PopupMenu::List(long long index) const {
-    if (index < 0 || index >= ListCount()) {
-        throw OutOfBoundsException("Popup row out of bounds");
-    }
-    return rows_[static_cast<size_t>(index)];
 }
 
 void PopupMenu::RaiseOpen() {
@@ -165,11 +158,11 @@ void Label::SetText(const std::string& text) {
 
 void Label::ApplyAlignment() {
     auto& label = static_cast<QLabel&>(LiveWidget());
-    const long long align = IntegerProperty("TextAlign");
+    const long long align = PropertyOr<long long>("TextAlign");
     const Qt::Alignment horizontal = align == 1   ? Qt::AlignHCenter
                                      : align == 2 ? Qt::AlignRight
                                                   : Qt::AlignLeft;
-    const bool multiline = BoolProperty("Multiline");
+    const bool multiline = PropertyOr<bool>("Multiline");
     label.setWordWrap(multiline);
     label.setAlignment(horizontal | (multiline ? Qt::AlignTop : Qt::AlignVCenter));
     label.setTextFormat(Qt::PlainText);
@@ -183,18 +176,6 @@ void TextArea::SetProperty(const std::string& name, const PropertyValue& value) 
     Control::SetProperty(name, value);
     if (name == "Text") {
         SetText(std::get<std::string>(value));
-    } else {
-        Apply(name, value);
-    }
-}
-
-void TextArea::Apply(const std::string& name, const PropertyValue& value) {
-    auto& edit = static_cast<TextPane&>(LiveWidget());
-    if (name == "Border") {
-        edit.setFrameShape(std::get<bool>(value) ? QFrame::StyledPanel : QFrame::NoFrame);
-    } else if (name == "ScrollbarVertical") {
-        edit.setVerticalScrollBarPolicy(std::get<bool>(value) ? Qt::ScrollBarAsNeeded
-                                                              : Qt::ScrollBarAlwaysOff);
     }
 }
 

@@ -46,8 +46,6 @@ class PopupMenu : public Control {
     std::string Text() const;
     long long ListIndex() const;
     void SetListIndex(long long index);
-    long long ListCount() const { return static_cast<long long>(rows_.size()); }
-    std::string List(long long index) const;
     void RaiseOpen() override;
 
     std::function<void(PopupMenu&)> Open;
@@ -81,7 +79,6 @@ class TextArea : public Control {
     void SetText(std::string text);
 
   private:
-    void Apply(const std::string& name, const PropertyValue& value);
     // Held once, by the control and its pane together.
     std::shared_ptr<const std::string> text_ = std::make_shared<const std::string>();
 };

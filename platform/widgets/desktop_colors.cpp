@@ -7,7 +7,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <optional>
 
 #include "platform/runtime/qt_color.h"
 
@@ -34,29 +33,23 @@ double Contrast(const QColor& a, const QColor& b) {
     return (std::max(la, lb) + 0.05) / (std::min(la, lb) + 0.05);
 }
 
-std::optional<Color> StoredColor(const PropertyObject& control, const char* name) {
-    const PropertyValue* value = control.Property(name);
-    if (!value || !std::holds_alternative<ColorWord>(*value)) {
-        return std::nullopt;
-    }
-    return std::get<ColorWord>(*value).value;
-}
-
 }  // namespace
 
 void ShowStoredColors(QWidget& widget, const PropertyObject& control) {
     // An empty palette: each role that is not set here is the application's, now and after
     // each change of it.
     QPalette palette;
-    if (const auto text = StoredColor(control, "TextColor"); text && *text != kDesktopText) {
+    if (const Color text = control.PropertyOr("TextColor", ColorWord{kDesktopText}).value;
+        text != kDesktopText) {
         // Active and inactive only: a disabled control keeps the desktop's greyed text.
         for (auto group : {QPalette::Active, QPalette::Inactive}) {
-            palette.setColor(group, QPalette::WindowText, ToQColor(*text));
-            palette.setColor(group, QPalette::Text, ToQColor(*text));
+            palette.setColor(group, QPalette::WindowText, ToQColor(text));
+            palette.setColor(group, QPalette::Text, ToQColor(text));
         }
     }
-    if (const auto back = StoredColor(control, "BackColor"); back && *back != kDesktopGround) {
-        palette.setColor(QPalette::Base, ToQColor(*back));
+    if (const Color back = control.PropertyOr("BackColor", ColorWord{kDesktopGround}).value;
+        back != kDesktopGround) {
+        palette.setColor(QPalette::Base, ToQColor(back));
     }
     widget.setPalette(palette);
 }

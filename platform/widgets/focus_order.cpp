@@ -10,17 +10,12 @@
 namespace {
 
 std::vector<long long> TabPath(const Control& control) {
-    std::vector<long long> path{control.IntegerProperty("TabIndex")};
+    std::vector<long long> path{control.PropertyOr<long long>("TabIndex")};
     for (auto above = control.Parent(); above; above = above->Parent()) {
-        path.push_back(above->IntegerProperty("TabIndex"));
+        path.push_back(above->PropertyOr<long long>("TabIndex"));
     }
     std::reverse(path.begin(), path.end());
     return path;
-}
-
-bool TabStop(const Control& control) {
-    const PropertyValue* stop = control.Property("TabStop");
-    return !stop || !std::holds_alternative<bool>(*stop) || std::get<bool>(*stop);
 }
 
 bool TakesTab(const QWidget& widget) {
@@ -32,7 +27,7 @@ bool TakesTab(const QWidget& widget) {
 std::vector<QWidget*> FocusOrder(const std::vector<Ref<Control>>& controls) {
     std::vector<std::pair<std::vector<long long>, const Control*>> placed;
     for (const auto& control : controls) {
-        if (control->IsShown() && TabStop(*control) && control->Widget()) {
+        if (control->IsShown() && control->PropertyOr<bool>("TabStop", true) && control->Widget()) {
             placed.emplace_back(TabPath(*control), &control.Get());
         }
     }

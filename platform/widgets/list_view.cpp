@@ -64,13 +64,11 @@ void ListView::SetDesignedWidths(std::vector<int> widths) {
     FitColumns();
 }
 
-QString ListView::SelectionText() const {
-    if (!model() || !HasSelectedRow()) {
-        return {};
-    }
-    const QModelIndexList rows = selectionModel()->selectedRows();
-    if (rows.isEmpty()) {
-        return {};
+void ListView::CopySelection() const {
+    const QModelIndexList rows =
+        HasSelectedRow() ? selectionModel()->selectedRows() : QModelIndexList();
+    if (!model() || rows.isEmpty()) {
+        return;
     }
     QStringList headings;
     QStringList cells;
@@ -78,13 +76,7 @@ QString ListView::SelectionText() const {
         headings << OneLine(model()->headerData(column, Qt::Horizontal).toString());
         cells << OneLine(model()->index(rows.first().row(), column).data().toString());
     }
-    return headings.join('\t') + '\n' + cells.join('\t') + '\n';
-}
-
-void ListView::CopySelection() const {
-    if (const QString text = SelectionText(); !text.isEmpty()) {
-        QApplication::clipboard()->setText(text);
-    }
+    QApplication::clipboard()->setText(headings.join('\t') + '\n' + cells.join('\t') + '\n');
 }
 
 void ListView::keyPressEvent(QKeyEvent* event) {
@@ -158,7 +150,10 @@ void ListView::keyboardSearch(const QString& search) {
     const int rows = model()->rowCount();
     const int current = currentIndex().isValid() ? currentIndex().row() : -1;
     const int first = oneLetter ? current + 1 : std::max(current, 0);
-    const int column = SearchColumn();
+    // The column that the list is sorted by, or the first.
+    const QHeaderView* header = horizontalHeader();
+    const int column =
+        header->isSortIndicatorShown() ? std::max(header->sortIndicatorSection(), 0) : 0;
     for (int i = 0; i < rows; ++i) {
         const QModelIndex index = model()->index((first + i) % rows, column);
         if (index.data().toString().startsWith(prefix, Qt::CaseInsensitive)) {
@@ -168,28 +163,29 @@ void ListView::keyboardSearch(const QString& search) {
     }
 }
 
-// The column that the list is sorted by, or the first.
-int ListView::SearchColumn() const {
-    const QHeaderView* header = horizontalHeader();
-    return header->isSortIndicatorShown() ? std::max(header->sortIndicatorSection(), 0) : 0;
-}
-
 // Also raised when the vertical scrollbar comes or goes, since that resizes the viewport.
 void ListView::resizeEvent(QResizeEvent* event) {
     QTableView::resizeEvent(event);
     FitColumns();
 }
 
+// The cell under the pointer shows its whole text as a tooltip when it is too narrow for it.
 bool ListView::viewportEvent(QEvent* event) {
-    if (event->type() == QEvent::ToolTip) {
-        const auto* help = static_cast<QHelpEvent*>(event);
-        if (!ShowCutCellText(help->pos(), help->globalPos())) {
-            QToolTip::hideText();
-            event->ignore();
-        }
-        return true;
+    if (event->type() != QEvent::ToolTip) {
+        return QTableView::viewportEvent(event);
     }
-    return QTableView::viewportEvent(event);
+    const auto* help = static_cast<QHelpEvent*>(event);
+    const QModelIndex index = indexAt(help->pos());
+    const QString text = index.data().toString();
+    const QRect cell = visualRect(index);
+    const int margin = style()->pixelMetric(QStyle::PM_FocusFrameHMargin, nullptr, this) + 1;
+    if (index.isValid() && fontMetrics().horizontalAdvance(text) + 2 * margin > cell.width()) {
+        QToolTip::showText(help->globalPos(), text, viewport(), cell);
+    } else {
+        QToolTip::hideText();
+        event->ignore();
+    }
+    return true;
 }
 
 // The columns share the inside of the list in the designed proportions; the scrollbar, when
@@ -210,20 +206,4 @@ void ListView::FitColumns() {
     for (size_t i = 0; i < widths.size(); ++i) {
         setColumnWidth(static_cast<int>(i), std::max(widths[i], 0));
     }
-}
-
-// Shows the whole text of the cell under the pointer when the cell is too narrow for it.
-bool ListView::ShowCutCellText(const QPoint& position, const QPoint& globalPosition) {
-    const QModelIndex index = indexAt(position);
-    if (!index.isValid()) {
-        return false;
-    }
-    const QString text = index.data().toString();
-    const QRect cell = visualRect(index);
-    const int margin = style()->pixelMetric(QStyle::PM_FocusFrameHMargin, nullptr, this) + 1;
-    if (fontMetrics().horizontalAdvance(text) + 2 * margin <= cell.width()) {
-        return false;
-    }
-    QToolTip::showText(globalPosition, text, viewport(), cell);
-    return true;
 }

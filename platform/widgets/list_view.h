@@ -23,10 +23,9 @@ class ListView : public QTableView {
 
     // The designed widths; the columns keep their proportions and always fit the list.
     void SetDesignedWidths(std::vector<int> widths);
-    // The heading line and the selected row, tab-separated, each line ending in a newline;
-    // empty without a selection.
     bool HasSelectedRow() const { return selectionModel() && selectionModel()->hasSelection(); }
-    QString SelectionText() const;
+    // Puts the heading line and the selected row on the clipboard, tab-separated, each line
+    // ending in a newline; without a selection it leaves the clipboard alone.
     void CopySelection() const;
 
   protected:
@@ -39,8 +38,6 @@ class ListView : public QTableView {
 
   private:
     void FitColumns();
-    int SearchColumn() const;
-    bool ShowCutCellText(const QPoint& position, const QPoint& globalPosition);
 
     std::vector<int> designedWidths_;
     QString search_;

@@ -54,9 +54,11 @@ class CellDelegate : public QStyledItemDelegate {
         painter.setClipRect(0, 0, option.rect.width(), option.rect.height());
         auto g = New<Graphics>(painter, option.rect.width(), option.rect.height(),
                                FromQColor(option.palette.color(QPalette::Base)));
-        Listbox& list = *owner_;
-        const bool handled = RaiseBooleanEvent(
-            [&] { return list.CellBackgroundPaint(list, g, index.row(), index.column()); });
+        // An exception in the handler counts as False.
+        bool handled = false;
+        RaiseEvent([&, list = owner_] {
+            handled = list->CellBackgroundPaint(*list, g, index.row(), index.column());
+        });
         painter.restore();
         return handled;
     }
@@ -90,17 +92,13 @@ Listbox::Listbox() : model_(std::make_unique<ListModel>()) {
     view->verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
     view->verticalHeader()->setDefaultSectionSize(Rows().RowHeight());
     view->horizontalHeader()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
-    view->horizontalHeader()->setHighlightSections(false);
     view->setSelectionMode(QAbstractItemView::SingleSelection);
     view->setSelectionBehavior(QAbstractItemView::SelectRows);
     view->setEditTriggers(QAbstractItemView::NoEditTriggers);
     view->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     view->setModel(model_.get());
     view->setItemDelegate(new CellDelegate(*this, view));
-    view->horizontalHeader()->setSectionsMovable(false);
     view->horizontalHeader()->setSectionsClickable(true);
-    view->horizontalHeader()->setSortIndicatorShown(false);
-    view->horizontalHeader()->setStretchLastSection(false);
     SetWidget(view);
 
     QObject::connect(view->horizontalHeader(), &QHeaderView::sectionClicked, Context(),
@@ -135,11 +133,6 @@ void Listbox::SetProperty(const std::string& name, const PropertyValue& value) {
     } else if (name == "DefaultRowHeight") {
         Rows().SetRowHeight(static_cast<int>(std::get<long long>(value)));
         view.verticalHeader()->setDefaultSectionSize(Rows().RowHeight());
-    } else if (name == "ScrollBarVertical") {
-        view.setVerticalScrollBarPolicy(std::get<bool>(value) ? Qt::ScrollBarAsNeeded
-                                                              : Qt::ScrollBarAlwaysOff);
-    } else if (name == "Border") {
-        view.setFrameShape(std::get<bool>(value) ? QFrame::StyledPanel : QFrame::NoFrame);
     }
 }
 
@@ -151,8 +144,9 @@ void Listbox::PropertiesApplied() {
         return;
     }
     ListView& view = View(LiveWidget());
-    QStringList headings = QString::fromStdString(StringProperty("InitialValue")).split('\t');
-    const int count = static_cast<int>(IntegerProperty("ColumnCount"));
+    QStringList headings =
+        QString::fromStdString(PropertyOr<std::string>("InitialValue")).split('\t');
+    const int count = static_cast<int>(PropertyOr<long long>("ColumnCount"));
     while (headings.size() < count) {
         headings.append(QString());
     }
@@ -161,9 +155,9 @@ void Listbox::PropertiesApplied() {
     // A screen reader names the list by its heading.
     view.setAccessibleName(headings.join(", "));
     view.horizontalHeader()->setSectionResizeMode(
-        BoolProperty("ColumnsResizable") ? QHeaderView::Interactive : QHeaderView::Fixed);
+        PropertyOr<bool>("ColumnsResizable") ? QHeaderView::Interactive : QHeaderView::Fixed);
     if (Property("ColumnWidths")) {
-        view.SetDesignedWidths(ParseWidths(StringProperty("ColumnWidths")));
+        view.SetDesignedWidths(ParseWidths(PropertyOr<std::string>("ColumnWidths")));
     }
 }
 

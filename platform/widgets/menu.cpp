@@ -36,22 +36,20 @@ bool EditItemApplies(const std::string& name) {
     return false;
 }
 
-void DoEditItem(const std::string& name) {
-    if (ListView* list = FocusedList()) {
-        list->CopySelection();
-        return;
-    }
-    TextPane* pane = FocusedPane();
-    if (name == "EditCopy") {
-        pane->Copy();
-    } else if (name == "EditSelectAll") {
-        pane->SelectAll();
-    }
-}
-
 bool IsEditItem(const std::string& name) {
     return name == "EditCopy" || name == "EditSelectAll" || name == "EditCut" ||
            name == "EditPaste" || name == "EditUndo" || name == "EditClear";
+}
+
+// The open menu shows what applies to the focused control now. Closed, every item stays
+// enabled so that its shortcut reaches Action, which checks again.
+void EnableEditItems(const QMenu& menu, bool open) {
+    for (QAction* action : menu.actions()) {
+        const std::string name = action->objectName().toStdString();
+        if (IsEditItem(name)) {
+            action->setEnabled(!open || EditItemApplies(name));
+        }
+    }
 }
 
 QString QtShortcut(const std::string& shortcut) {
@@ -81,27 +79,8 @@ void AddItems(QMenu* menu, const MenuItem& parent) {
             }
         });
     }
-    const QList<QAction*> actions = menu->actions();
-    if (std::any_of(actions.begin(), actions.end(),
-                    [](QAction* a) { return IsEditItem(a->objectName().toStdString()); })) {
-        // The open menu shows what applies to the focused control now. Closed, every item
-        // stays enabled so that its shortcut reaches Action, which checks again.
-        QObject::connect(menu, &QMenu::aboutToShow, menu, [menu] {
-            for (QAction* action : menu->actions()) {
-                const std::string name = action->objectName().toStdString();
-                if (IsEditItem(name)) {
-                    action->setEnabled(EditItemApplies(name));
-                }
-            }
-        });
-        QObject::connect(menu, &QMenu::aboutToHide, menu, [menu] {
-            for (QAction* action : menu->actions()) {
-                if (IsEditItem(action->objectName().toStdString())) {
-                    action->setEnabled(true);
-                }
-            }
-        });
-    }
+    QObject::connect(menu, &QMenu::aboutToShow, menu, [menu] { EnableEditItems(*menu, true); });
+    QObject::connect(menu, &QMenu::aboutToHide, menu, [menu] { EnableEditItems(*menu, false); });
 }
 
 }  // namespace
@@ -135,8 +114,15 @@ Ref<MenuItem> MenuItem::_Lookup(const std::string& name) const {
 }
 
 void MenuItem::Action() {
-    if (IsEditItem(Name) && EditItemApplies(Name)) {
-        DoEditItem(Name);
+    if (!EditItemApplies(Name)) {
+        return;
+    }
+    if (ListView* list = FocusedList()) {
+        list->CopySelection();
+    } else if (Name == "EditCopy") {
+        FocusedPane()->Copy();
+    } else {
+        FocusedPane()->SelectAll();
     }
 }
 

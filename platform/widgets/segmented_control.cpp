@@ -35,14 +35,10 @@ void SegmentedControl::ItemList::Append(const Ref<SegmentedControlItem>& item) {
 }
 
 Ref<SegmentedControlItem> SegmentedControl::ItemList::operator[](long long index) const {
-    if (index < 0 || index >= Count()) {
+    if (index < 0 || index >= static_cast<long long>(owner_.items_.size())) {
         throw OutOfBoundsException("Segment index out of bounds");
     }
     return owner_.items_[static_cast<size_t>(index)];
-}
-
-long long SegmentedControl::ItemList::Count() const {
-    return static_cast<long long>(owner_.items_.size());
 }
 
 SegmentedControl::SegmentedControl() {

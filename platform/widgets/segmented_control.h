@@ -11,9 +11,7 @@ class SegmentedControl;
 
 class SegmentedControlItem {
   public:
-    std::string Title() const { return title_; }
     void SetTitle(const std::string& title);
-    long long Width() const { return width_; }
     void SetWidth(long long width);
     bool Selected() const { return selected_; }
     // Marks the segment as chosen or not, as the user sees it.
@@ -35,7 +33,6 @@ class SegmentedControl : public Control {
         explicit ItemList(SegmentedControl& owner) : owner_(owner) {}
         void Append(const Ref<SegmentedControlItem>& item);
         Ref<SegmentedControlItem> operator[](long long index) const;
-        long long Count() const;
 
       private:
         SegmentedControl& owner_;

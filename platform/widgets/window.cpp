@@ -98,7 +98,7 @@ void Window::Constructor() {
         RaiseEvent([&control] { control->RaiseOpen(); });
     }
     RaiseEvent([this] { Event_Open(); });
-    if (BoolProperty("Visible")) {
+    if (PropertyOr<bool>("Visible")) {
         native_->show();
     }
 }
@@ -111,17 +111,13 @@ void Window::SetProperty(const std::string& name, const PropertyValue& value) {
     if (name == "Title") {
         native_->setWindowTitle(QString::fromStdString(std::get<std::string>(value)));
     } else if (name == "Width" || name == "Height") {
-        client_->setFixedSize(static_cast<int>(IntegerProperty("Width")),
-                              static_cast<int>(IntegerProperty("Height")));
+        client_->setFixedSize(static_cast<int>(PropertyOr<long long>("Width")),
+                              static_cast<int>(PropertyOr<long long>("Height")));
     } else if (name == "BackColor") {
         SetBackColor(std::get<ColorWord>(value).value);
     } else if (name == "MenuBarVisible" && native_->menuWidget()) {
         native_->menuWidget()->setVisible(std::get<bool>(value));
     }
-}
-
-std::string Window::Title() const {
-    return StringProperty("Title");
 }
 
 void Window::SetBackColor(Color color) {
@@ -176,10 +172,6 @@ void Window::Close() {
     if (native_) {
         native_->close();
     }
-}
-
-QWidget* Window::Client() const {
-    return client_;
 }
 
 QWidget* Window::Native() const {

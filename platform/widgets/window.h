@@ -34,7 +34,7 @@ class Window : public PropertyObject,
     void SetProperty(const std::string& name, const PropertyValue& value) override;
 
     const std::string& ClassName() const { return className_; }
-    std::string Title() const;
+    std::string Title() const { return PropertyOr<std::string>("Title"); }
     Color BackColor() const { return backColor_; }
     void SetBackColor(Color color);
     Ref<::MenuBar> MenuBar() const { return menuBar_; }
@@ -60,7 +60,7 @@ class Window : public PropertyObject,
     bool IsOpen() const { return open_; }
 
     // Platform use.
-    QWidget* Client() const override;
+    QWidget* Client() const override { return client_; }
     QWidget* Native() const;
     void UpdateVisibility() override;
     void NativeClosed();
