@@ -38,6 +38,20 @@ void Application::_MacOSNotificationReceived(const std::string& name) {
     }
 }
 
+void Application::_x_SetVersionData(long long major, long long minor, long long bug,
+                                    long long nonRelease, long long stageCode,
+                                    std::string longVersion, std::string shortVersion,
+                                    std::string packageInfo) {
+    MajorVersion = major;
+    MinorVersion = minor;
+    BugVersion = bug;
+    NonReleaseVersion = nonRelease;
+    StageCode = stageCode;
+    LongVersion = std::move(longVersion);
+    ShortVersion = std::move(shortVersion);
+    PackageInfo = std::move(packageInfo);
+}
+
 Ref<Application> CurrentApplication() {
     return theApplication;
 }

@@ -30,10 +30,18 @@ class Application : public _MacOSDistributedNotifications::iNotify {
     // Raises AppearanceChanged for either of the two appearance notification names.
     void _MacOSNotificationReceived(const std::string& name) override;
 
-    // The version record: major, minor, bug and non-release version, stage code, long and short
-    // version, package information. Nothing reads it back, so it is not kept.
-    void _x_SetVersionData(long long, long long, long long, long long, long long, std::string,
-                           std::string, std::string) {}
+    void _x_SetVersionData(long long major, long long minor, long long bug, long long nonRelease,
+                           long long stageCode, std::string longVersion, std::string shortVersion,
+                           std::string packageInfo);
+
+    long long MajorVersion = 0;
+    long long MinorVersion = 0;
+    long long BugVersion = 0;
+    long long NonReleaseVersion = 0;
+    long long StageCode = 0;
+    std::string LongVersion;
+    std::string ShortVersion;
+    std::string PackageInfo;
 
     Ref<::MenuBar> MenuBar;
 };
