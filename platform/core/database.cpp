@@ -6,7 +6,6 @@
 #include <algorithm>
 #include <chrono>
 #include <filesystem>
-#include <optional>
 #include <string_view>
 #include <system_error>
 #include <thread>
@@ -61,10 +60,8 @@ constexpr size_t kLookEvery = size_t{4} << 20;
 
 void (*waitHook)() = nullptr;
 std::chrono::milliseconds quietLimit = std::chrono::seconds(30);
-// When the current call into SQLite first called the progress handler, or empty before it has.
-// Read there and not at every call: a clock read for each row made a list load 5% longer.
-// Reads run on one thread, one call at a time.
-std::optional<Clock::time_point> workBegan;
+// When the current call into SQLite began. Reads run on one thread, one call at a time.
+Clock::time_point workBegan;
 
 // A lock that another connection holds is waited for, kLockWait at most, with the hook called
 // between two tries.
@@ -87,10 +84,7 @@ int OnBusy(void*, int tries) {
 // Called every kProgressInstructions steps of SQLite's machine: a call that has given no row for
 // the quiet limit is interrupted, and fails as any other failed call does.
 int OnProgress(void*) {
-    const auto now = Clock::now();
-    if (!workBegan) {
-        workBegan = now;
-    } else if (now - *workBegan > quietLimit) {
+    if (Clock::now() - workBegan > quietLimit) {
         return 1;
     }
     if (waitHook) {
@@ -100,7 +94,7 @@ int OnProgress(void*) {
 }
 
 int Step(sqlite3_stmt* statement) {
-    workBegan.reset();
+    workBegan = Clock::now();
     return sqlite3_step(statement);
 }
 
@@ -136,10 +130,9 @@ RecordSet::~RecordSet() {
     Close();
 }
 
-const Ref<DatabaseField>& RecordSet::Field(std::string_view name) const {
-    static const Ref<DatabaseField> nil;
+Ref<DatabaseField> RecordSet::Field(std::string_view name) const {
     if (!statement_ || atEnd_) {
-        return nil;
+        return nullptr;
     }
     for (const auto& [asked, column] : found_) {
         if (asked == name) {
@@ -152,12 +145,12 @@ const Ref<DatabaseField>& RecordSet::Field(std::string_view name) const {
             return FieldAt(column);
         }
     }
-    return nil;
+    return nullptr;
 }
 
 // SQLite hands out the column's value unprotected, which only matters to another thread, and
 // the connection is this thread's alone.
-const Ref<DatabaseField>& RecordSet::FieldAt(size_t column) const {
+Ref<DatabaseField> RecordSet::FieldAt(size_t column) const {
     sqlite3_value* value = sqlite3_column_value(statement_.get(), static_cast<int>(column));
     const auto* text = reinterpret_cast<const char*>(sqlite3_value_text(value));
     const auto bytes = static_cast<size_t>(sqlite3_value_bytes(value));
@@ -189,10 +182,10 @@ void RecordSet::MoveNext() {
     }
 }
 
-// The fields stay, so that what Field handed out stays valid as long as the record set.
 void RecordSet::Close() {
     std::for_each(fields_.begin(), fields_.end(), LetGoIfHeld);
     statement_.reset();
+    fields_.clear();
     atEnd_ = true;
 }
 
@@ -224,7 +217,7 @@ bool SQLiteDatabase::Connect() {
     sqlite3_busy_handler(db, OnBusy, nullptr);
     sqlite3_progress_handler(db, kProgressInstructions, OnProgress, nullptr);
     // Opening is lazy: reading the schema tells whether this is a database that can be read.
-    workBegan.reset();
+    workBegan = Clock::now();
     if (sqlite3_exec(db, "select count(*) from sqlite_master", nullptr, nullptr, nullptr) !=
         SQLITE_OK) {
         return false;
@@ -239,7 +232,7 @@ Ref<RecordSet> SQLiteDatabase::SQLSelect(const std::string& statement) {
     }
     sqlite3_stmt* prepared = nullptr;
     const char* tail = nullptr;
-    workBegan.reset();  // a changed schema is read again here
+    workBegan = Clock::now();  // a changed schema is read again here
     const int result = sqlite3_prepare_v2(connection_.get(), statement.c_str(),
                                           static_cast<int>(statement.size()), &prepared, &tail);
     StatementPtr owned(prepared);
