@@ -2,11 +2,9 @@
 // run-time's edges: the exception helper keeps the class of what it catches, start-up takes
 // nothing from the command line and makes a relative root absolute, and window, control and
 // message operations refuse any thread but the main one.
-#include <unistd.h>
-
-#include <QMainWindow>
 #include <QProcess>
 
+#include <algorithm>
 #include <thread>
 
 #include "platform/runtime/runtime.h"
@@ -30,14 +28,6 @@ State StateOf(const Ref<class Window1>& window) {
     }
     EXPECT_TRUE(second) << "pages 1 and 2 go with the second segment";
     return page == 1 ? State::Listing : State::Reporting;
-}
-
-int VisibleWindows() {
-    int count = 0;
-    for (QWidget* widget : QApplication::topLevelWidgets()) {
-        count += qobject_cast<QMainWindow*>(widget) && widget->isVisible() ? 1 : 0;
-    }
-    return count;
 }
 
 using ShellTest = WindowTest;
@@ -79,22 +69,16 @@ TEST_F(ShellTest, MainPaintsTheEmptyListFirstAndNeverTheInstallationPage) {
     EXPECT_EQ(window->Listbox1()->ListCount(), 0);
     EXPECT_EQ(window->Title(), "Orbelane Verification Storage");
     EXPECT_TRUE(window->Native()->isVisible());
+    EXPECT_EQ(std::ranges::count_if(QApplication::topLevelWidgets(), &QWidget::isVisible), 1);
 }
 
-TEST_F(ShellTest, EitherOrderOfOpenAndLateStartupGivesOneWindowOnTheList) {
+// The platform may raise Open before late start-up: the window is then built in Open, and late
+// start-up makes no other.
+TEST_F(ShellTest, OpenBeforeLateStartupLeavesOneWindowOnTheList) {
     _EarlyStartup();
     CurrentApplication()->Event_Open();
     _LateStartup();
-    EXPECT_EQ(VisibleWindows(), 1);
-    EXPECT_EQ(StateOf(Window1()), State::Listing);
-
-    QApplication::closeAllWindows();
-    ProcessEvents();
-    _EarlyStartup();
-    _LateStartup();
-    EXPECT_EQ(StateOf(Window1()), State::Installing) << "built on page 0 until Open";
-    CurrentApplication()->Event_Open();
-    EXPECT_EQ(VisibleWindows(), 1);
+    EXPECT_EQ(std::ranges::count_if(QApplication::topLevelWidgets(), &QWidget::isVisible), 1);
     EXPECT_EQ(StateOf(Window1()), State::Listing);
 }
 
