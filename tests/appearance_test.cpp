@@ -76,6 +76,8 @@ TEST_F(AppearanceTest, EachChangeRecoloursTheWindowTheStripesAndEveryText) {
         window->Listbox1()->SetListIndex(2);
         EXPECT_NE(Stripe(window, 2), dark ? qRgb(22, 22, 22) : qRgb(237, 243, 254))
             << "the selected row is marked";
+        window->Listbox1()->SetListIndex(0);
+        ExpectReadable(View(window).viewport()->grab(QRect(0, 0, 400, 25)).toImage(), "chosen");
         window->Listbox1()->SetListIndex(-1);
 
         // The segments take the palette's colours at each paint; the chosen one's title and

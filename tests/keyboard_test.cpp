@@ -9,7 +9,6 @@
 #include <QPushButton>
 
 #include "contrast.h"
-#include "platform/runtime/appearance.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
@@ -18,14 +17,6 @@ namespace {
 
 class KeyboardTest : public WindowTest {
   protected:
-    // The window as the user has it: shown, active, with the list focused.
-    Ref<class Window1> StartFocused() {
-        auto window = StartUp();
-        QApplication::setActiveWindow(window->Native());
-        View(window).setFocus();
-        ProcessEvents();
-        return window;
-    }
     void Key(int key, Qt::KeyboardModifiers modifiers = {}) {
         QWidget* focus = QApplication::focusWidget();
         ASSERT_NE(focus, nullptr);
@@ -34,7 +25,8 @@ class KeyboardTest : public WindowTest {
     }
 };
 
-// End selects the last row; Copy puts the heading line and that row on the clipboard, and
+// The focused list rings its current row without choosing it, and the first Down chooses that
+// row. End selects the last row; Copy puts the heading line and that row on the clipboard, and
 // Return opens its report. A page that comes into view takes the focus at its first control in
 // the keyboard order when the focus would go out of view with the page before; a text pane
 // rings itself while focused. Tab leaves the list for the segments, where Space chooses a page
@@ -59,6 +51,10 @@ TEST_F(KeyboardTest, ThroughThePagesByKeys) {
     EXPECT_EQ(QApplication::clipboard()->text(), "before");
     Key(Qt::Key_Return);
     EXPECT_EQ(window->PagePanel1()->Value(), 1) << "no row selected, nothing to open";
+    QWidget* rows = View(window).viewport();
+    EXPECT_GE(Contrast(Pixel(rows, 2, 12), Pixel(rows, 120, 12)), 4.5) << "the row is ringed";
+    Key(Qt::Key_Down);
+    EXPECT_EQ(window->Listbox1()->ListIndex(), 0) << "the first Down chooses the ringed row";
 
     Key(Qt::Key_End);
     ASSERT_EQ(window->Listbox1()->ListIndex(), 2);
@@ -92,29 +88,6 @@ TEST_F(KeyboardTest, ThroughThePagesByKeys) {
     View(window).setFocus();
     window->MainTabs()->Press(0);
     EXPECT_EQ(QApplication::focusWidget(), window->PushButton1()->Widget());
-}
-
-// The list that gets the focus rings its first row without choosing it; the first Down chooses
-// that row. The ring and the chosen row's text read on their grounds in either appearance.
-TEST_F(KeyboardTest, TheFocusedListRingsItsCurrentRowWhichTheFirstDownChooses) {
-    Store({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin.ai")});
-    for (auto appearance : {Appearance::Light, Appearance::Dark}) {
-        SetAppearanceForTesting(appearance);
-        auto window = StartFocused();
-        QWidget* rows = View(window).viewport();
-        const QRgb ground = Pixel(rows, 120, 12);
-        EXPECT_GE(Contrast(Pixel(rows, 2, 12), ground), 4.5) << "the current row is ringed";
-        EXPECT_EQ(window->Listbox1()->ListIndex(), -1);
-
-        Key(Qt::Key_Down);
-        EXPECT_EQ(window->Listbox1()->ListIndex(), 0);
-        const QImage chosen = rows->grab(QRect(0, 0, 400, 25)).toImage();
-        EXPECT_GE(Contrast(Ink(chosen, Ground(chosen)), Ground(chosen)), 4.5);
-        Key(Qt::Key_Down);
-        EXPECT_EQ(window->Listbox1()->ListIndex(), 1);
-        window->Close();
-        ProcessEvents();
-    }
 }
 
 class AccessibilityTest : public WindowTest {
