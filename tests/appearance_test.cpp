@@ -6,7 +6,6 @@
 #include <QPushButton>
 
 #include "contrast.h"
-#include "platform/runtime/appearance.h"
 #include "platform/runtime/notifications.h"
 #include "window_fixture.h"
 

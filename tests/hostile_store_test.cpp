@@ -11,7 +11,6 @@
 
 #include "platform/core/database.h"
 #include "platform/core/memory_bound.h"
-#include "platform/runtime/yield.h"
 #include "window_fixture.h"
 
 using namespace testsupport;

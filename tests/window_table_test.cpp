@@ -5,7 +5,6 @@
 #include <QMenu>
 #include <QPushButton>
 #include <QStyle>
-#include <QTest>
 
 #include "platform/runtime/application_style.h"
 #include "window_fixture.h"
