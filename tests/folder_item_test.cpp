@@ -6,11 +6,8 @@
 #include <unistd.h>
 
 #include <QColor>
-#include <QGuiApplication>
 #include <QIcon>
 #include <QImage>
-
-#include <cstdlib>
 
 #include "installer/copy.h"
 #include "platform/core/folder_item.h"
@@ -206,26 +203,19 @@ std::string Square(const char* colour) {
 TEST(ResourcesFolder, WindowIconComesFromTheThemeElseTheInstalledFile) {
     const QStringList searchPaths = QIcon::themeSearchPaths();
     const QString themeName = QIcon::themeName();
-    const struct {
-        const char* theme;      // the colour of the theme's icon of that name, or none
-        const char* installed;  // of the icon installed with the program, or none
-        const char* shown;      // in the window's icon, or none at all
-    } cases[] = {{"#0000ff", "#ff0000", "#0000ff"},
-                 {nullptr, "#ff0000", "#ff0000"},
-                 {"#0000ff", nullptr, "#0000ff"},
-                 {nullptr, nullptr, nullptr}};
-    for (const auto& icon : cases) {
-        SCOPED_TRACE(&icon - cases);
+    // The colours of the theme's icon of that name and of the installed one, or no such icon.
+    const std::pair<const char*, const char*> cases[] = {
+        {"#0000ff", "#ff0000"}, {nullptr, "#ff0000"}, {"#0000ff", nullptr}, {nullptr, nullptr}};
+    for (const auto& [theme, installed] : cases) {
         TempDir tree;
-        const fs::path themes = tree.Path() / "themes";
+        const fs::path themes = tree.Path() / "themes", prefix = tree.Path() / "opt/my tools";
         WriteFile(themes / "test/index.theme",
                   "[Icon Theme]\nName=Test\nDirectories=apps\n\n[apps]\nSize=16\nType=Scalable\n");
-        if (icon.theme) {
-            WriteFile(themes / "test/apps/ovs.svg", Square(icon.theme));
+        if (theme) {
+            WriteFile(themes / "test/apps/ovs.svg", Square(theme));
         }
-        const fs::path prefix = tree.Path() / "opt/my tools";
-        if (icon.installed) {
-            WriteFile(prefix / "share/icons/hicolor/scalable/apps/ovs.svg", Square(icon.installed));
+        if (installed) {
+            WriteFile(prefix / "share/icons/hicolor/scalable/apps/ovs.svg", Square(installed));
         }
         QIcon::setThemeSearchPaths({QString::fromStdString(themes.string())});
         QIcon::setThemeName("test");
@@ -234,11 +224,10 @@ TEST(ResourcesFolder, WindowIconComesFromTheThemeElseTheInstalledFile) {
         UseInstalledIcon(prefix / "bin/ovs");
 
         const QPixmap shown = QGuiApplication::windowIcon().pixmap(16);
-        if (icon.shown) {
-            EXPECT_EQ(shown.toImage().pixelColor(8, 8), QColor(icon.shown));
-        } else {
-            EXPECT_TRUE(shown.isNull());
-        }
+        const char* expected = theme ? theme : installed;
+        EXPECT_EQ(shown.isNull() ? QColor() : shown.toImage().pixelColor(8, 8),
+                  expected ? QColor(expected) : QColor())
+            << (theme ? "theme " : "") << (installed ? "installed" : "");
     }
     QIcon::setThemeSearchPaths(searchPaths);
     QIcon::setThemeName(themeName);

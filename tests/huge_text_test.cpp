@@ -14,13 +14,7 @@ namespace {
 
 constexpr size_t kHuge = 4 << 20;
 
-class HugeTextTest : public WindowTest {
-  protected:
-    qsizetype Drawn(const Ref<class Window1>& window, int row, int column) {
-        const QAbstractItemModel& model = *View(window).model();
-        return model.data(model.index(row, column), Qt::DisplayRole).toString().size();
-    }
-};
+using HugeTextTest = WindowTest;
 
 TEST_F(HugeTextTest, TheListAndThePanesHoldEveryByteAndTheCellsDrawAPrefix) {
     // The second report's two blocks list 200000 bars each: many short lines.
@@ -31,14 +25,18 @@ TEST_F(HugeTextTest, TheListAndThePanesHoldEveryByteAndTheCellsDrawAPrefix) {
                  {"2", "2018-11-05", std::string(kHuge, 'd'), "C", manyLines},
                  {"3", "2018-11-06", "Tin.ai", "D", "Code reads 43"}});
     auto list = window->Listbox1();
+    const auto drawn = [&](int row, int column) {
+        const QAbstractItemModel& model = *View(window).model();
+        return model.data(model.index(row, column), Qt::DisplayRole).toString().size();
+    };
     ASSERT_EQ(list->ListCount(), 3);
     EXPECT_EQ(list->Cell(0, 2).size(), kHuge + 1) << "the read value, whole";
     EXPECT_EQ(list->Cell(1, 1).size(), kHuge) << "the document, whole";
     EXPECT_EQ(list->Cell(1, 2), " 5012345678900");
     EXPECT_EQ(VariantToString(list->RowTag(2)), "3");
-    EXPECT_EQ(Drawn(window, 0, 2), static_cast<qsizetype>(kShownInCell) + 1) << "and an ellipsis";
-    EXPECT_EQ(Drawn(window, 1, 1), static_cast<qsizetype>(kShownInCell) + 1);
-    EXPECT_EQ(Drawn(window, 2, 2), 3);
+    EXPECT_EQ(drawn(0, 2), static_cast<qsizetype>(kShownInCell) + 1) << "and an ellipsis";
+    EXPECT_EQ(drawn(1, 1), static_cast<qsizetype>(kShownInCell) + 1);
+    EXPECT_EQ(drawn(2, 2), 3);
 
     ASSERT_TRUE(DoubleClickRow(window, 1));
     const size_t begin = manyLines.find("= +- mic 0\r") + 11;

@@ -2,8 +2,8 @@
 // message that was shown and the files that stand afterwards.
 #include <unistd.h>
 
-#include <algorithm>
 #include <cstdio>
+#include <set>
 
 #include <QAbstractItemView>
 #include <QComboBox>
@@ -57,12 +57,11 @@ class InstallerTest : public WindowTest {
         return log.messages.empty() ? std::string() : log.messages.front();
     }
     // Every path in the tree, to tell that a press changed nothing.
-    std::vector<fs::path> Listing() const {
-        std::vector<fs::path> paths;
+    std::set<fs::path> Listing() const {
+        std::set<fs::path> paths;
         for (const auto& entry : fs::recursive_directory_iterator(tree.Path())) {
-            paths.push_back(entry.path());
+            paths.insert(entry.path());
         }
-        std::sort(paths.begin(), paths.end());
         return paths;
     }
     bool Installed(const fs::path& folder, const char* plugin) const {

@@ -9,32 +9,16 @@
 #include <QPushButton>
 
 #include "contrast.h"
-#include "platform/runtime/appearance.h"
 #include "window_fixture.h"
 
 using namespace testsupport;
 
 namespace {
 
-class KeyboardTest : public WindowTest {
-  protected:
-    // The window as the user has it: shown, active, with the list focused.
-    Ref<class Window1> StartFocused() {
-        auto window = StartUp();
-        QApplication::setActiveWindow(window->Native());
-        View(window).setFocus();
-        ProcessEvents();
-        return window;
-    }
-    void Key(int key, Qt::KeyboardModifiers modifiers = {}) {
-        QWidget* focus = QApplication::focusWidget();
-        ASSERT_NE(focus, nullptr);
-        QTest::keyClick(focus, static_cast<Qt::Key>(key), modifiers);
-        ProcessEvents();
-    }
-};
+using KeyboardTest = WindowTest;
 
-// End selects the last row; Copy puts the heading line and that row on the clipboard, and
+// The focused list rings its current row without choosing it, and the first Down chooses that
+// row. End selects the last row; Copy puts the heading line and that row on the clipboard, and
 // Return opens its report. A page that comes into view takes the focus at its first control in
 // the keyboard order when the focus would go out of view with the page before; a text pane
 // rings itself while focused. Tab leaves the list for the segments, where Space chooses a page
@@ -44,6 +28,11 @@ TEST_F(KeyboardTest, ThroughThePagesByKeys) {
         StartUp({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin\tlid.ai")});
     QApplication::setActiveWindow(window->Native());
     ASSERT_EQ(QApplication::focusWidget(), &View(window)) << "the list page, at start";
+    const auto press = [](Qt::Key key, Qt::KeyboardModifiers modifiers = {}) {
+        ASSERT_NE(QApplication::focusWidget(), nullptr);
+        QTest::keyClick(QApplication::focusWidget(), key, modifiers);
+        ProcessEvents();
+    };
     auto* copy = InMenuBar<QAction>(window, "EditCopy");
     ASSERT_NE(copy, nullptr);
     EXPECT_EQ(copy->shortcut(), QKeySequence(QKeySequence::Copy));
@@ -55,36 +44,40 @@ TEST_F(KeyboardTest, ThroughThePagesByKeys) {
     };
     QApplication::clipboard()->setText("before");
     EXPECT_FALSE(offered()) << "nothing selected";
-    Key(Qt::Key_C, Qt::ControlModifier);
+    press(Qt::Key_C, Qt::ControlModifier);
     EXPECT_EQ(QApplication::clipboard()->text(), "before");
-    Key(Qt::Key_Return);
+    press(Qt::Key_Return);
     EXPECT_EQ(window->PagePanel1()->Value(), 1) << "no row selected, nothing to open";
+    QWidget* rows = View(window).viewport();
+    EXPECT_GE(Contrast(Pixel(rows, 2, 12), Pixel(rows, 120, 12)), 4.5) << "the row is ringed";
+    press(Qt::Key_Down);
+    EXPECT_EQ(window->Listbox1()->ListIndex(), 0) << "the first Down chooses the ringed row";
 
-    Key(Qt::Key_End);
+    press(Qt::Key_End);
     ASSERT_EQ(window->Listbox1()->ListIndex(), 2);
     EXPECT_TRUE(offered());
-    Key(Qt::Key_C, Qt::ControlModifier);
+    press(Qt::Key_C, Qt::ControlModifier);
     EXPECT_EQ(QApplication::clipboard()->text().toStdString(),
               "Date - Time\tDocument\tRead Value\tGrade\n2018-11-03\tTin lid.ai\t 3\tA\n");
-    Key(Qt::Key_Return);
+    press(Qt::Key_Return);
     EXPECT_EQ(window->PagePanel1()->Value(), 2);
     EXPECT_EQ(window->Label6(7)->Text(), "Tin\tlid.ai");
 
     EXPECT_EQ(QApplication::focusWidget(), window->PushButton2()->Widget());
     auto* pane = static_cast<QAbstractScrollArea*>(window->TextArea1()->Widget());
     const QRgb ground = Pixel(pane->viewport(), 1, 1);
-    Key(Qt::Key_Tab);
-    Key(Qt::Key_Tab);
+    press(Qt::Key_Tab);
+    press(Qt::Key_Tab);
     ASSERT_EQ(QApplication::focusWidget(), pane);
     EXPECT_GE(Contrast(Pixel(pane->viewport(), 1, 1), ground), 4.5) << "the pane is ringed";
     window->PushButton2()->Push();
     ASSERT_EQ(QApplication::focusWidget(), &View(window));
 
-    Key(Qt::Key_Tab);
+    press(Qt::Key_Tab);
     ASSERT_TRUE(window->MainTabs()->Widget()->isAncestorOf(QApplication::focusWidget()))
         << "Tab reaches a segment";
     EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation");
-    Key(Qt::Key_Space);
+    press(Qt::Key_Space);
     EXPECT_EQ(window->PagePanel1()->Value(), 0);
     EXPECT_EQ(static_cast<QPushButton*>(QApplication::focusWidget())->text(), "Installation")
         << "the focus stays on the segments that chose the page";
@@ -94,80 +87,55 @@ TEST_F(KeyboardTest, ThroughThePagesByKeys) {
     EXPECT_EQ(QApplication::focusWidget(), window->PushButton1()->Widget());
 }
 
-// The list that gets the focus rings its first row without choosing it; the first Down chooses
-// that row. The ring and the chosen row's text read on their grounds in either appearance.
-TEST_F(KeyboardTest, TheFocusedListRingsItsCurrentRowWhichTheFirstDownChooses) {
-    Store({Result("1", "Box.ai"), Result("2", "Jar.ai"), Result("3", "Tin.ai")});
-    for (auto appearance : {Appearance::Light, Appearance::Dark}) {
-        SetAppearanceForTesting(appearance);
-        auto window = StartFocused();
-        QWidget* rows = View(window).viewport();
-        const QRgb ground = Pixel(rows, 120, 12);
-        EXPECT_GE(Contrast(Pixel(rows, 2, 12), ground), 4.5) << "the current row is ringed";
-        EXPECT_EQ(window->Listbox1()->ListIndex(), -1);
-
-        Key(Qt::Key_Down);
-        EXPECT_EQ(window->Listbox1()->ListIndex(), 0);
-        const QImage chosen = rows->grab(QRect(0, 0, 400, 25)).toImage();
-        EXPECT_GE(Contrast(Ink(chosen, Ground(chosen)), Ground(chosen)), 4.5);
-        Key(Qt::Key_Down);
-        EXPECT_EQ(window->Listbox1()->ListIndex(), 1);
-        window->Close();
-        ProcessEvents();
-    }
-}
-
-class AccessibilityTest : public WindowTest {
-  protected:
-    static QAccessibleInterface& Spoken(QWidget* widget) {
-        QAccessibleInterface* spoken = QAccessible::queryAccessibleInterface(widget);
-        EXPECT_NE(spoken, nullptr);
-        return *spoken;
-    }
-    static std::string Name(QWidget* widget) {
-        return Spoken(widget).text(QAccessible::Name).toStdString();
-    }
-};
+using AccessibilityTest = WindowTest;
 
 // The segments are page tabs of which one is selected, and a screen reader presses a tab as a
 // user clicks it. The panes are named by their tabs, and each value of the report is labelled
 // by the caption at its height; the centred line has none.
 TEST_F(AccessibilityTest, TheSegmentsThePanesAndTheValuesAreSpoken) {
+    const auto spoken = [](QWidget* widget) -> QAccessibleInterface& {
+        QAccessibleInterface* found = QAccessible::queryAccessibleInterface(widget);
+        EXPECT_NE(found, nullptr);
+        return *found;
+    };
+    const auto name = [&](QWidget* widget) {
+        return spoken(widget).text(QAccessible::Name).toStdString();
+    };
     auto window = StartUp({Result("1", "Box.ai")});
     QWidget* row = window->MainTabs()->Widget();
-    EXPECT_EQ(Spoken(row).role(), QAccessible::PageTabList);
+    EXPECT_EQ(spoken(row).role(), QAccessible::PageTabList);
     const auto segments = row->findChildren<QPushButton*>(Qt::FindDirectChildrenOnly);
     ASSERT_EQ(segments.size(), 2);
     for (int i = 0; i < 2; ++i) {
-        QAccessibleInterface& tab = Spoken(segments[i]);
+        QAccessibleInterface& tab = spoken(segments[i]);
         EXPECT_EQ(tab.role(), QAccessible::PageTab);
         EXPECT_EQ(tab.parent()->role(), QAccessible::PageTabList);
         EXPECT_TRUE(tab.state().selectable);
         EXPECT_EQ(tab.state().selected, i == 1) << "the list page's tab";
         EXPECT_FALSE(tab.state().checkable);
     }
-    EXPECT_EQ(Name(segments[0]), "Installation");
-    EXPECT_EQ(Name(segments[1]), "Verification Results");
+    EXPECT_EQ(name(segments[0]), "Installation");
+    EXPECT_EQ(name(segments[1]), "Verification Results");
 
     ASSERT_TRUE(DoubleClickRow(window, 0));
-    EXPECT_EQ(Name(window->TextArea1()->Widget()), "Measurements");
-    EXPECT_TRUE(Spoken(window->TextArea1()->Widget()).state().readOnly) << "a text to read";
+    EXPECT_EQ(name(window->TextArea1()->Widget()), "Measurements");
+    EXPECT_TRUE(spoken(window->TextArea1()->Widget()).state().readOnly) << "a text to read";
     window->TabPanel1()->SetValue(1);
-    EXPECT_EQ(Name(window->TextArea2()->Widget()), "Deviances");
+    EXPECT_EQ(name(window->TextArea2()->Widget()), "Deviances");
     const std::vector<std::pair<long long, long long>> captionOfValue = {
         {6, 7}, {0, 0}, {1, 1}, {2, 2}, {3, 3}, {4, 4}, {5, 5}, {7, 8}};
     for (const auto& [caption, value] : captionOfValue) {
-        const auto labels = Spoken(window->Label6(value)->Widget()).relations(QAccessible::Label);
+        const auto labels = spoken(window->Label6(value)->Widget()).relations(QAccessible::Label);
         ASSERT_EQ(labels.size(), 1) << "Label6(" << value << ")";
         EXPECT_EQ(labels.front().first->text(QAccessible::Name).toStdString(),
                   window->Label5(caption)->Text());
     }
-    EXPECT_TRUE(Spoken(window->Label6(6)->Widget()).relations(QAccessible::Label).isEmpty());
+    EXPECT_TRUE(spoken(window->Label6(6)->Widget()).relations(QAccessible::Label).isEmpty());
 
-    Spoken(segments[0]).actionInterface()->doAction(QAccessibleActionInterface::pressAction());
+    spoken(segments[0]).actionInterface()->doAction(QAccessibleActionInterface::pressAction());
     EXPECT_EQ(window->PagePanel1()->Value(), 0);
-    EXPECT_TRUE(Spoken(segments[0]).state().selected);
-    EXPECT_FALSE(Spoken(segments[1]).state().selected);
+    EXPECT_TRUE(spoken(segments[0]).state().selected);
+    EXPECT_FALSE(spoken(segments[1]).state().selected);
 }
 
 }  // namespace

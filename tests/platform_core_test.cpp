@@ -6,7 +6,6 @@
 
 #include <gtest/gtest.h>
 
-#include <cmath>
 #include <limits>
 #include <random>
 
@@ -28,30 +27,6 @@ TEST(Ref, NilRaisesAndCastsAreTested) {
     EXPECT_FALSE(Cast<Derived>(something).IsNil());
     EXPECT_THROW(Cast<Other>(something), IllegalCastException);
     EXPECT_TRUE(Cast<Other>(Ref<Base>()).IsNil());
-}
-
-TEST(PropertyBlock, TheBytesAreTheDocumentedLayoutAndDecodeBack) {
-    PropertyBlock block;
-    block.Add("Visible", true)
-        .Add("Left", -2147483648LL)
-        .Add("TextColor", ColorWord{0x112233})
-        .Add("TextSize", 12.5f)
-        .Add("LineSpacing", 1.25)
-        .Add("Name", std::string("ab"));
-    const std::string expected =
-        std::string("Visible \x01", 9) + "Left " + std::string("\0\0\0\x80\xFF\xFF\xFF\xFF", 8) +
-        "TextColor " + std::string("\x33\x22\x11\x00", 4) + "TextSize " +
-        std::string("\0\0\x48\x41", 4) + "LineSpacing " + std::string("\0\0\0\0\0\0\xF4\x3F", 8) +
-        "Name " + std::string("\x02\0\0\0", 4) + "ab";
-    EXPECT_EQ(block.Bytes(), expected);
-    const auto entries = DecodePropertyBlock(block.Bytes());
-    ASSERT_EQ(entries.size(), 6u);
-    EXPECT_EQ(std::get<long long>(entries[1].second), -2147483648LL);
-    EXPECT_EQ(std::get<ColorWord>(entries[2].second).value, 0x112233u);
-    EXPECT_EQ(std::get<float>(entries[3].second), 12.5f);
-    EXPECT_EQ(std::get<double>(entries[4].second), 1.25);
-    EXPECT_EQ(entries[5].first, "Name");
-    EXPECT_EQ(std::get<std::string>(entries[5].second), "ab");
 }
 
 // A value of the wrong type is refused when built; a truncated block raises instead of reading

@@ -11,8 +11,6 @@
 #include <csignal>
 
 #include "contrast.h"
-#include "platform/runtime/appearance.h"
-#include "platform/runtime/yield.h"
 #include "scripts/stand_in_portal.h"
 #include "window_fixture.h"
 

@@ -6,19 +6,14 @@
 #include <optional>
 #include <random>
 
+#include "demo/demo_tree.h"
 #include "platform/core/text.h"
 
 namespace {
 
-const std::string kLayoutA =
-    "Code reads 1234567890128\rCode is EAN 13\r\rSymbol Length 29.83 mm\rCode is Sized at 80 "
-    "%\rBWR Measured As 15 mic\rBar Deviance 6 mic\rAll bars within tolerance\rActual "
-    "Measurements = +- mic 0\rBar 1 330\rBar 2 660\rBar/Space Deviances = +- mic 0\rBar 1 "
-    "+4\rBar 2 -2";
-
-// Lines one and two the other way round.
-const std::string kLayoutB =
-    "Code is EAN 13\rCode reads 1234567890128" + kLayoutA.substr(kLayoutA.find("\r\r"));
+// Both layouts as the plug-in writes them.
+const std::string kLayoutA = demo::ReportText(demo::Layout::A, "1234567890128", "EAN 13", 2);
+const std::string kLayoutB = demo::ReportText(demo::Layout::B, "1234567890128", "EAN 13", 2);
 
 // Each reader of lines one and two on both layouts and the sharp cases: the list's read value,
 // the report's read value and code type, and whether the report shows at all.
@@ -61,7 +56,7 @@ TEST(ReportText, CrLfCarriesTheLineFeedIntoLineEightAndTheBlocks) {
     }
     EXPECT_EQ(SymbolLength(text), " 29.83 mm") << "the line feed stands ahead of the marker";
     EXPECT_EQ(FreeLine(text), "\nAll bars within tolerance");
-    EXPECT_EQ(MeasurementsBlock(text), "\r\nBar 1 330\r\nBar 2 660\r\n");
+    EXPECT_EQ(MeasurementsBlock(text), "\r\nBar 1 660\r\nBar 2 990\r\n");
 }
 
 TEST(ReportText, MissingAndReversedBlockMarkers) {

@@ -34,16 +34,10 @@ struct Driver {
     std::string Text() {
         static const size_t kEdges[] = {0, 1, 127, 128, 129, 16383, 16384, 16385};
         const int kind = Pick(100);
-        size_t length = 0;
-        if (kind < 50) {
-            length = static_cast<size_t>(Pick(24));
-        } else if (kind < 75) {
-            length = kEdges[Pick(std::size(kEdges))];
-        } else if (kind < 98) {
-            length = 1000 + static_cast<size_t>(Pick(60000));
-        } else {
-            length = kMiB + static_cast<size_t>(Pick(4096));
-        }
+        const size_t length = kind < 50   ? static_cast<size_t>(Pick(24))
+                              : kind < 75 ? kEdges[Pick(std::size(kEdges))]
+                              : kind < 98 ? 1000 + static_cast<size_t>(Pick(60000))
+                                          : kMiB + static_cast<size_t>(Pick(4096));
         return std::string(length, static_cast<char>('a' + Pick(26)));
     }
     std::mt19937 random;

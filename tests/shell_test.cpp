@@ -2,11 +2,9 @@
 // run-time's edges: the exception helper keeps the class of what it catches, start-up takes
 // nothing from the command line and makes a relative root absolute, and window, control and
 // message operations refuse any thread but the main one.
-#include <unistd.h>
-
-#include <QMainWindow>
 #include <QProcess>
 
+#include <algorithm>
 #include <thread>
 
 #include "platform/runtime/runtime.h"
@@ -30,14 +28,6 @@ State StateOf(const Ref<class Window1>& window) {
     }
     EXPECT_TRUE(second) << "pages 1 and 2 go with the second segment";
     return page == 1 ? State::Listing : State::Reporting;
-}
-
-int VisibleWindows() {
-    int count = 0;
-    for (QWidget* widget : QApplication::topLevelWidgets()) {
-        count += qobject_cast<QMainWindow*>(widget) && widget->isVisible() ? 1 : 0;
-    }
-    return count;
 }
 
 using ShellTest = WindowTest;
@@ -79,22 +69,16 @@ TEST_F(ShellTest, MainPaintsTheEmptyListFirstAndNeverTheInstallationPage) {
     EXPECT_EQ(window->Listbox1()->ListCount(), 0);
     EXPECT_EQ(window->Title(), "Orbelane Verification Storage");
     EXPECT_TRUE(window->Native()->isVisible());
+    EXPECT_EQ(std::ranges::count_if(QApplication::topLevelWidgets(), &QWidget::isVisible), 1);
 }
 
-TEST_F(ShellTest, EitherOrderOfOpenAndLateStartupGivesOneWindowOnTheList) {
+// The platform may raise Open before late start-up: the window is then built in Open, and late
+// start-up makes no other.
+TEST_F(ShellTest, OpenBeforeLateStartupLeavesOneWindowOnTheList) {
     _EarlyStartup();
     CurrentApplication()->Event_Open();
     _LateStartup();
-    EXPECT_EQ(VisibleWindows(), 1);
-    EXPECT_EQ(StateOf(Window1()), State::Listing);
-
-    QApplication::closeAllWindows();
-    ProcessEvents();
-    _EarlyStartup();
-    _LateStartup();
-    EXPECT_EQ(StateOf(Window1()), State::Installing) << "built on page 0 until Open";
-    CurrentApplication()->Event_Open();
-    EXPECT_EQ(VisibleWindows(), 1);
+    EXPECT_EQ(std::ranges::count_if(QApplication::topLevelWidgets(), &QWidget::isVisible), 1);
     EXPECT_EQ(StateOf(Window1()), State::Listing);
 }
 
@@ -205,27 +189,21 @@ TEST_F(ThreadGuardTest, WindowControlAndMessageOperationsRefuseOtherThreads) {
     auto window = StartUp();
     auto panel = window->PagePanel1();
     MessageLog log;
-    std::vector<std::string> refused;
     std::thread([&] {
-        auto attempt = [&](const char* name, const std::function<void()>& operation) {
-            try {
-                operation();
-            } catch (const ThreadAccessingUIException& e) {
-                EXPECT_EQ(e.Message,
-                          "A thread has attempted to manipulate a user interface element. This "
-                          "can only be done from the application's main thread.");
-                refused.push_back(name);
-            }
-        };
-        attempt("MsgBox", [] { MsgBox("from a thread"); });
-        attempt("BackColor", [&] { window->SetBackColor(0); });
-        attempt("ControlByName", [&] { window->_ControlByName("Listbox1"); });
-        attempt("Close", [&] { window->Close(); });
-        attempt("ImplicitWindow", [] { _GetImplicitWindow("Window1.Window1"); });
-        attempt("Control", [&] { panel->SetValue(0); });
+        try {
+            MsgBox("from a thread");
+            ADD_FAILURE() << "MsgBox";
+        } catch (const ThreadAccessingUIException& e) {
+            EXPECT_EQ(e.Message,
+                      "A thread has attempted to manipulate a user interface element. This can "
+                      "only be done from the application's main thread.");
+        }
+        EXPECT_THROW(window->SetBackColor(0), ThreadAccessingUIException);
+        EXPECT_THROW(window->_ControlByName("Listbox1"), ThreadAccessingUIException);
+        EXPECT_THROW(window->Close(), ThreadAccessingUIException);
+        EXPECT_THROW(_GetImplicitWindow("Window1.Window1"), ThreadAccessingUIException);
+        EXPECT_THROW(panel->SetValue(0), ThreadAccessingUIException);
     }).join();
-    EXPECT_EQ(refused, (std::vector<std::string>{"MsgBox", "BackColor", "ControlByName", "Close",
-                                                 "ImplicitWindow", "Control"}));
     EXPECT_TRUE(log.messages.empty());
     EXPECT_TRUE(window->IsOpen());
     EXPECT_EQ(window->PagePanel1()->Value(), 1);

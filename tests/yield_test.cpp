@@ -5,7 +5,6 @@
 #include <QPushButton>
 
 #include "platform/runtime/runtime.h"
-#include "platform/runtime/yield.h"
 #include "window_fixture.h"
 
 using namespace testsupport;

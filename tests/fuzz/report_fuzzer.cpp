@@ -24,16 +24,11 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     const std::string separator = nul == std::string::npos ? "\r" : input.substr(nul + 1);
 
     ListReadValue(text);
-    ReportReadValue(text);
-    ReportCodeType(text);
     PassesReportTest(text);
-    SymbolLength(text);
-    Scale(text);
-    Bwr(text);
-    BarDeviance(text);
-    FreeLine(text);
-    MeasurementsBlock(text);
-    DeviancesBlock(text);
+    for (auto read : {ReportReadValue, ReportCodeType, SymbolLength, Scale, Bwr, BarDeviance,
+                      FreeLine, MeasurementsBlock, DeviancesBlock}) {
+        read(text);
+    }
 
     const long long fields = CountFields(text, separator);
     Require(fields >= 1);
