@@ -7,6 +7,6 @@
 
 #include "platform/widgets/control.h"
 
-// Names and captions the controls whose widgets are built; those built later get theirs at a
-// later call.
+// Names and captions the controls, once their widgets are built: places and tab titles do
+// not change after that.
 void NameByNeighbours(const std::vector<Ref<Control>>& controls);

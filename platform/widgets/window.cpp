@@ -88,6 +88,7 @@ void Window::Constructor() {
     CreateControls();
     built_ = true;
     UpdateVisibility();
+    NameByNeighbours(controls_);
 
     // The windows hold the application's objects, which must go before the Qt application.
     static const bool releasedAtFinalize = (RuntimeAtFinalize(ReleaseAllWindows), true);
@@ -213,7 +214,6 @@ void Window::UpdateVisibility() {
     if (focusLeaves) {
         FocusFirstOf(controls_, coming);
     }
-    NameByNeighbours(controls_);
 }
 
 void Window::NativeClosed() {
