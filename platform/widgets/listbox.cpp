@@ -31,9 +31,11 @@ class CellDelegate : public QStyledItemDelegate {
         // The selected row's text reads on the desktop's selection colour.
         QStyleOptionViewItem plain = option;
         plain.state &= ~QStyle::State_HasFocus;
-        plain.palette.setColor(QPalette::Highlight,
-                               ReadableGround(option.palette.color(QPalette::Highlight),
-                                              option.palette.color(QPalette::HighlightedText)));
+        if (option.state & QStyle::State_Selected) {
+            plain.palette.setColor(QPalette::Highlight,
+                                   ReadableGround(option.palette.color(QPalette::Highlight),
+                                                  option.palette.color(QPalette::HighlightedText)));
+        }
         QStyledItemDelegate::paint(painter, plain, index);
     }
 
