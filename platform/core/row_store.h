@@ -12,7 +12,6 @@ class RowStore {
   public:
     explicit RowStore(int fieldCount) : fieldCount_(fieldCount) {}
 
-    int FieldCount() const { return fieldCount_; }
     void SetFieldCount(int fieldCount);  // drops all rows
     size_t Count() const { return places_.size(); }
     void AddRow();
