@@ -16,6 +16,8 @@
 #include <algorithm>
 #include <numeric>
 
+#include "platform/widgets/list_model.h"
+
 namespace {
 
 constexpr qreal kRingWidth = 2.0;
@@ -54,7 +56,7 @@ class ListHeader : public QHeaderView {
 
 }  // namespace
 
-ListView::ListView() {
+ListView::ListView() : showDuringLoad_([this] { ShowRowsAddedSoFar(*this); }) {
     setHorizontalHeader(new ListHeader(this));
     setTabKeyNavigation(false);
 }

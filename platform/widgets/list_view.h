@@ -7,7 +7,6 @@
 #include <QTableView>
 
 #include <functional>
-#include <optional>
 #include <vector>
 
 #include "platform/runtime/yield.h"
@@ -18,8 +17,6 @@ class ListView : public QTableView {
 
     // Return or Enter on the selected row: what a double click on it does.
     std::function<void()> OpenRequested;
-    // What the list shows of a load while the handler that loads it is still running.
-    std::optional<YieldHook> ShowDuringLoad;
 
     // The designed widths; the columns keep their proportions and always fit the list.
     void SetDesignedWidths(std::vector<int> widths);
@@ -42,4 +39,6 @@ class ListView : public QTableView {
     std::vector<int> designedWidths_;
     QString search_;
     QElapsedTimer searchClock_;
+    // What the list shows of a load while the handler that loads it is still running.
+    YieldHook showDuringLoad_;
 };

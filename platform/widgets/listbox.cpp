@@ -107,7 +107,6 @@ Listbox::Listbox() : model_(std::make_unique<ListModel>()) {
                      [this](int column) { PressHeading(column); });
     QObject::connect(view, &QTableView::doubleClicked, Context(), [this] { RaiseDoubleClick(); });
     view->OpenRequested = [this] { RaiseDoubleClick(); };
-    view->ShowDuringLoad.emplace([view] { ShowRowsAddedSoFar(*view); });
     QObject::connect(view->selectionModel(), &QItemSelectionModel::selectionChanged, Context(),
                      [this] {
                          if (Change) {
