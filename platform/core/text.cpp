@@ -30,10 +30,6 @@ bool IsAscii(std::string_view text) {
                        [](char c) { return static_cast<unsigned char>(c) < 0x80; });
 }
 
-bool IsContinuation(unsigned char byte) {
-    return (byte & 0xC0) == 0x80;
-}
-
 // Decodes one character at `at`; a byte that does not start a valid sequence stands for
 // itself, mapped to a code point that no valid character folds to.
 char32_t DecodeAt(std::string_view text, size_t at, size_t& length) {
@@ -53,12 +49,11 @@ char32_t DecodeAt(std::string_view text, size_t at, size_t& length) {
     }
     char32_t code = lead & (0x3F >> extra);
     for (int i = 1; i <= extra; ++i) {
-        const auto byte = static_cast<unsigned char>(text[at + i]);
-        if (!IsContinuation(byte)) {
+        if (!IsContinuation(text[at + i])) {
             length = 1;
             return 0x110000 + lead;
         }
-        code = (code << 6) | (byte & 0x3F);
+        code = (code << 6) | (static_cast<unsigned char>(text[at + i]) & 0x3F);
     }
     length = static_cast<size_t>(extra) + 1;
     return code;
@@ -107,9 +102,8 @@ Match Find(std::string_view source, size_t from, std::string_view find) {
 }
 
 size_t CharacterCount(std::string_view text) {
-    return static_cast<size_t>(std::count_if(text.begin(), text.end(), [](char c) {
-        return !IsContinuation(static_cast<unsigned char>(c));
-    }));
+    return static_cast<size_t>(
+        std::count_if(text.begin(), text.end(), [](char c) { return !IsContinuation(c); }));
 }
 
 // Byte offset of the character that follows `count` characters from the start.
@@ -117,7 +111,7 @@ size_t ByteOffsetOf(std::string_view text, long long count) {
     size_t at = 0;
     while (count > 0 && at < text.size()) {
         ++at;
-        while (at < text.size() && IsContinuation(static_cast<unsigned char>(text[at]))) {
+        while (at < text.size() && IsContinuation(text[at])) {
             ++at;
         }
         --count;

@@ -10,6 +10,11 @@ std::string NthField(std::string_view source, std::string_view separator, long l
 std::string_view NthFieldView(std::string_view source, std::string_view separator, long long n);
 long long CountFields(std::string_view source, std::string_view separator);
 
+// A byte inside a UTF-8 character, not at its start.
+inline bool IsContinuation(char byte) {
+    return (static_cast<unsigned char>(byte) & 0xC0) == 0x80;
+}
+
 // An ASCII capital as its small letter; every other byte as it is.
 inline char FoldAscii(char c) {
     return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c;

