@@ -153,11 +153,7 @@ INSTANTIATE_TEST_SUITE_P(
 // transaction, then moves its log into the store, while the list loads: the list shows the
 // store as it stood when the load began, and the next load shows the change.
 TEST_F(LongReadTest, AStoreWrittenDuringTheLoadIsListedAsItWasWhenTheLoadBegan) {
-    std::vector<demo::StoredResult> rows;
-    for (int i = 1; i <= 300; ++i) {
-        rows.push_back(Result(std::to_string(i), "Old.ai"));
-    }
-    Store(rows);
+    Store(demo::InventedResults(300, false));
     ExecSql(store, "pragma journal_mode=wal");
     SetYieldIntervalForTesting(std::chrono::nanoseconds(0));
     int paints = 0;
@@ -172,7 +168,8 @@ TEST_F(LongReadTest, AStoreWrittenDuringTheLoadIsListedAsItWasWhenTheLoadBegan) 
     ASSERT_GT(paints, 100);
     auto documents = Column(window, 1);
     ASSERT_EQ(documents.size(), 300u);
-    EXPECT_EQ(documents.front() + " " + documents.back(), "Old.ai Old.ai");
+    EXPECT_NE(documents.front(), "New.ai");
+    EXPECT_NE(documents.back(), "New.ai");
     window->MainTabs()->Press(0);
     window->MainTabs()->Press(1);
     documents = Column(window, 1);

@@ -161,9 +161,10 @@ TEST_F(InstallerTest, EachRowOfTheDecisionTable) {
             EXPECT_EQ(Listing(), before);
             continue;
         }
-        // A second press over an install installs again.
+        // A second press over an install, whose files may be read-only, installs again.
         const char* plugin = c.row == kIllustrator ? "Quilbrant.aip" : "Ostrelin.acroplugin";
         EXPECT_TRUE(Installed(below(c.into), plugin));
+        fs::permissions(below(c.into) / plugin / "Contents/MacOS/binary", fs::perms::owner_read);
         WriteFile(resources / plugin / "Contents/MacOS/binary", "version 2");
         EXPECT_EQ(Press(c.row), c.message);
         EXPECT_EQ(ReadFile(below(c.into) / plugin / "Contents/MacOS/binary"), "version 2");
@@ -201,6 +202,18 @@ TEST_F(InstallerTest, AnOddTreeIsToldAndLosesNothing) {
              WriteFile(b / "Contents" / Deep() / "strings", "deep");
          },
          kAcroDone, kCopied + Deep() + "/strings", "deep"},
+        // The same folder linked twice side by side, and not on one path, is no loop.
+        {[](const fs::path& b, const fs::path&) {
+             WriteFile(b.parent_path() / "shared/s.txt", "s");
+             fs::create_directory_symlink(b.parent_path() / "shared", b / "Contents/one");
+             fs::create_directory_symlink(b.parent_path() / "shared", b / "Contents/two");
+         },
+         kAcroDone, kCopied + "two/s.txt", "s"},
+        // An alias to nothing where the plug-in's folder goes is left as it is.
+        {[](const fs::path&, const fs::path& p) {
+             fs::create_symlink("gone", p / "Ostrelin.acroplugin");
+         },
+         kCatchAll, "Plug-ins/Ostrelin.acroplugin", nullptr},
         // A plug-in that is a plain file is never written in the Plug-ins folder's place.
         {[](const fs::path& b, const fs::path& p) {
              fs::remove(p);

@@ -10,13 +10,13 @@ namespace {
 
 class ListPageTest : public WindowTest {};
 
-// The store's columns are found by name, in any order and beside others. A click on a heading
-// sorts without regard to case, the tags going with their rows, and the order holds across
-// reloads.
+// The store's columns are found by name, in any order and beside others, and an integer id
+// reads as text. A click on a heading sorts without regard to case, the tags going with their
+// rows, and the order holds across reloads.
 TEST_F(ListPageTest, StartUpShowsTheStoredRowsInTheirColumnsAndAHeadingSortsThem) {
     const std::string schema =
         "create table results_store (results text, extra int, grade text, document text, id "
-        "text, datetime text)";
+        "integer, datetime text)";
     std::vector<demo::StoredResult> rows = {
         Result("1", "b.ai"),
         {"2", std::nullopt, std::nullopt, std::nullopt, "Code is UPC A\rCode reads 0361"},

@@ -100,11 +100,6 @@ TEST(Text, InStrAgreesWithAPlainScanOnRandomTexts) {
     }
 }
 
-TEST(Text, TrimTakesWhiteSpaceOffBothEndsOnly) {
-    EXPECT_EQ(Trim(" \r\n\tBar 1\r Bar 2 \r\n"), "Bar 1\r Bar 2");
-    EXPECT_EQ(Trim(" \r\n\t "), "");
-}
-
 // No words such as "inf" or "nan", only digits; beyond the range of a double the value is what a
 // double makes of the text.
 TEST(Text, ValReadsTheLeadingNumber) {

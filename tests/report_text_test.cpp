@@ -59,20 +59,6 @@ TEST(ReportText, CrLfCarriesTheLineFeedIntoLineEightAndTheBlocks) {
     EXPECT_EQ(MeasurementsBlock(text), "\r\nBar 1 660\r\nBar 2 990\r\n");
 }
 
-TEST(ReportText, MissingAndReversedBlockMarkers) {
-    const std::string m = "Actual Measurements = +- mic 0", d = "Bar/Space Deviances = +- mic 0";
-    const std::string cases[][3] = {
-        // The text, its measurements block and its deviances block.
-        {"Code reads 1\r" + d + "\rBar 1 +4", "", "\rBar 1 +4"},
-        {"Code reads 1\r" + m + "\rBar 1 330", "\rBar 1 330", ""},
-        {"x\r" + d + "\rD\r" + m + "\rM", "\rM", "\rD\r" + m + "\rM"},
-    };
-    for (const auto& [text, measurements, deviances] : cases) {
-        EXPECT_EQ(MeasurementsBlock(text), measurements) << text;
-        EXPECT_EQ(DeviancesBlock(text), deviances) << text;
-    }
-}
-
 }  // namespace
 
 // The list's reader against the plain rule, read through the general field splitter, on

@@ -1,6 +1,6 @@
-// The read side of the results store on real SQLite files: a WAL store, numbers and blobs,
-// hostile ids, and a store that is never written. Stores that end the read early are met on
-// the window in hostile_store_test.
+// The read side of the results store on real SQLite files: a WAL store, fields that outlive
+// their row, hostile ids, and a store that is never written. Stores that end the read early are
+// met on the window in hostile_store_test.
 #include <set>
 
 #include "demo/demo_tree.h"
@@ -71,22 +71,6 @@ TEST_F(StoreTest, FieldsAndRecordSetsOutliveWhatTheyCameFrom) {
     EXPECT_EQ(first->StringValue() + again->StringValue(), "11");
     rows->Close();
     EXPECT_EQ(std::string(*document), firstDocument);
-}
-
-TEST_F(StoreTest, NumbersAndBlobsReadAsText) {
-    demo::WriteStore(
-        store, {},
-        "create table results_store (id integer primary key, datetime real, results blob)");
-    ExecSql(store, "insert into results_store values (12, 2.5, x'436f6465')");
-    SQLiteDatabase db;
-    auto rows = OpenStore(db, RowQuery("12"));
-    ASSERT_FALSE(rows.IsNil());
-    EXPECT_EQ(std::string(*rows->Field("datetime")) + "|" + std::string(*rows->Field("RESULTS")),
-              "2.5|Code")
-        << "names match without case";
-    EXPECT_TRUE(rows->Field("no_such_column").IsNil());
-    rows->MoveNext();
-    EXPECT_TRUE(rows->Eof());
 }
 
 TEST_F(StoreTest, HostileIdsEndTheReadAndRunNothingElse) {

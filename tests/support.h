@@ -13,7 +13,6 @@
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
-#include <optional>
 #include <string>
 #include <vector>
 
@@ -47,15 +46,9 @@ class TempDir {
 class ScopedRoot {
   public:
     explicit ScopedRoot(const std::filesystem::path& root) {
-        if (const char* old = std::getenv("ORBELANE_ROOT")) {
-            old_ = old;
-        }
         setenv("ORBELANE_ROOT", root.c_str(), 1);
     }
-    ~ScopedRoot() { old_ ? setenv("ORBELANE_ROOT", old_->c_str(), 1) : unsetenv("ORBELANE_ROOT"); }
-
-  private:
-    std::optional<std::string> old_;
+    ~ScopedRoot() { unsetenv("ORBELANE_ROOT"); }
 };
 
 // Reads every message that MsgBox would show.
