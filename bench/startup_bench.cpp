@@ -1,5 +1,6 @@
-// Times process start to the window shown on the list page, against a minimal Qt program that
-// shows one window, alternating the two in one run. Prints both medians and their ratio.
+// Times process start to the window shown on the list page (to the first rows painted, on a
+// store with results), against a minimal Qt program that shows one window, alternating the two
+// in one run. Prints both medians and their ratio.
 #include <spawn.h>
 #include <sys/wait.h>
 
